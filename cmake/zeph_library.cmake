@@ -1,0 +1,27 @@
+# One static library a folder. It links exactly the folders it may include, so an upward include does not compile.
+#   zeph_library(zeph_engine SOURCES a.cpp b.cpp LINKS zeph_model Qt6::Gui [MOC])
+function(zeph_library name)
+    cmake_parse_arguments(PARSE_ARGV 1 arg "MOC" "" "SOURCES;LINKS")
+    add_library(${name} STATIC ${arg_SOURCES})
+    target_include_directories(${name} PUBLIC ${CMAKE_SOURCE_DIR}/src)
+    target_link_libraries(${name} PUBLIC ${arg_LINKS})
+    target_precompile_headers(${name} PRIVATE <algorithm> <array> <cstdint> <functional> <memory> <string> <string_view>
+                              <vector>)
+    if(arg_MOC)
+        set_target_properties(${name} PROPERTIES AUTOMOC ON)
+    endif()
+endfunction()
+
+# One test program a folder: zeph_tests(engine SOURCES ... LINKS ...). WINDOWS tests run with a virtual screen.
+function(zeph_tests folder)
+    cmake_parse_arguments(PARSE_ARGV 1 arg "MOC" "" "SOURCES;LINKS")
+    set(name ${folder}_tests)
+    add_executable(${name} ${arg_SOURCES})
+    target_include_directories(${name} PRIVATE ${CMAKE_SOURCE_DIR}/src ${CMAKE_SOURCE_DIR})
+    target_link_libraries(${name} PRIVATE ${arg_LINKS} GTest::gmock GTest::gtest_main)
+    target_precompile_headers(${name} PRIVATE <gtest/gtest.h> <string> <vector>)
+    if(arg_MOC)
+        set_target_properties(${name} PROPERTIES AUTOMOC ON)
+    endif()
+    add_test(NAME ${folder} COMMAND ${name})
+endfunction()

@@ -1,0 +1,195 @@
+#include "model/channel_identity.h"
+#include "model/data_directories.h"
+#include "model/document.h"
+#include "model/tables.h"
+#include "tests/support/recording_host.h"
+
+#include <gtest/gtest.h>
+
+#include <algorithm>
+
+namespace {
+
+class QuietWatcher : public DocumentWatcher {
+public:
+    void selectionCleared() override { ++selections; }
+    void fixtureRemoved(int fixture) override { removed.push_back(fixture); }
+    void objectListChanged() override { ++lists; }
+    void canvasChanged() override { ++canvases; }
+    void editSessionReset() override {}
+    void clipboardAndStatusCleared() override { ++clipboards; }
+
+    std::vector<int> removed;
+    int selections = 0;
+    int lists = 0;
+    int canvases = 0;
+    int clipboards = 0;
+};
+
+struct Display {
+    std::unique_ptr<ZephSimulation> simulation = std::make_unique<ZephSimulation>();
+    QuietWatcher watcher;
+
+    Display(int fixtures, int props) {
+        simulation->FixtureCount = fixtures;
+        simulation->PropCount = props;
+        for (int f = 1; f <= fixtures; ++f)
+            simulation->Fixtures[f].Name = "F" + std::to_string(f);
+        for (int p = 1; p <= props; ++p)
+            simulation->Props[p].Name = "P" + std::to_string(p);
+    }
+};
+
+}  // namespace
+
+TEST(Props, AFixtureAddedToAFullPropPointsAtItButIsNotListed) {
+    Display display(65, 1);
+    for (int f = 1; f <= 64; ++f)
+        EXPECT_TRUE(ZephAddFixtureToProp(f, 1, *display.simulation));
+    EXPECT_TRUE(ZephAddFixtureToProp(64, 1, *display.simulation)) << "a second time changes nothing";
+    EXPECT_FALSE(ZephAddFixtureToProp(65, 1, *display.simulation));
+    const ZephProp& prop = display.simulation->Props[1];
+    EXPECT_EQ(prop.AssignedCount, 64);
+    EXPECT_EQ(prop.Object[64], 64);
+    EXPECT_EQ(display.simulation->Fixtures[65].AssignedItem, 1);
+    EXPECT_EQ(display.simulation->Fixtures[65].AssignedItemName, "P1");
+}
+
+TEST(Props, AMissMarksTheDocumentDirtyAndKeepsTheAssignment) {
+    Display display(2, 1);
+    ZephAddFixtureToProp(1, 1, *display.simulation);
+    display.simulation->Fixtures[2].AssignedItem = 1;
+    display.simulation->SimulationDirty = false;
+    EXPECT_FALSE(ZephDeleteFixtureFromProp(2, 1, *display.simulation));
+    EXPECT_TRUE(display.simulation->SimulationDirty);
+    EXPECT_EQ(display.simulation->Fixtures[2].AssignedItem, 1);
+    EXPECT_FALSE(ZephDisassociateFromProp(2, 1, *display.simulation));
+    EXPECT_EQ(display.simulation->Fixtures[2].AssignedItem, 0);
+    EXPECT_TRUE(ZephDeleteFixtureFromProp(1, 1, *display.simulation));
+    EXPECT_EQ(display.simulation->Props[1].AssignedCount, 0);
+}
+
+TEST(Deleting, AFixtureRenumbersEveryMemberAboveIt) {
+    Display display(10, 2);
+    for (const int f : {4, 5, 6, 10})
+        ZephAddFixtureToProp(f, 2, *display.simulation);
+    ZephDeleteThisFixture(5, false, *display.simulation, display.watcher);
+    const ZephProp& prop = display.simulation->Props[2];
+    EXPECT_EQ(prop.AssignedCount, 3);
+    EXPECT_EQ(prop.Object[1], 4);
+    EXPECT_EQ(prop.Object[2], 5);
+    EXPECT_EQ(prop.Object[3], 9);
+    EXPECT_EQ(display.simulation->FixtureCount, 9);
+    EXPECT_EQ(display.simulation->Fixtures[5].Name, "F6");
+    EXPECT_EQ(display.simulation->Fixtures[5].AssignedItem, 2);
+    EXPECT_EQ(display.simulation->Fixtures[10].Name, "") << "the freed record is cleared";
+    EXPECT_EQ(display.watcher.removed, std::vector<int>{5});
+}
+
+TEST(Deleting, APropMovesTheLaterOnesDownAndFreesItsMembers) {
+    Display display(3, 3);
+    ZephAddFixtureToProp(1, 1, *display.simulation);
+    ZephAddFixtureToProp(2, 2, *display.simulation);
+    ZephAddFixtureToProp(3, 3, *display.simulation);
+    EXPECT_TRUE(ZephDeleteThisProp(2, *display.simulation));
+    EXPECT_EQ(display.simulation->PropCount, 2);
+    EXPECT_EQ(display.simulation->Props[2].Name, "P3");
+    EXPECT_EQ(display.simulation->Fixtures[1].AssignedItem, 1);
+    EXPECT_EQ(display.simulation->Fixtures[2].AssignedItem, 0);
+    EXPECT_EQ(display.simulation->Fixtures[3].AssignedItem, 2);
+    EXPECT_EQ(display.simulation->Fixtures[3].AssignedItemName, "P3");
+}
+
+TEST(Deleting, ByPropEmptiesThePropAndRebuildsTheListOnce) {
+    Display display(5, 1);
+    for (const int f : {2, 4, 5})
+        ZephAddFixtureToProp(f, 1, *display.simulation);
+    EXPECT_TRUE(ZephDeleteFixturesByProp(4, *display.simulation, display.watcher));
+    EXPECT_EQ(display.simulation->FixtureCount, 2);
+    EXPECT_EQ(display.simulation->Fixtures[1].Name, "F1");
+    EXPECT_EQ(display.simulation->Fixtures[2].Name, "F3");
+    EXPECT_EQ(display.simulation->PropCount, 1);
+    EXPECT_EQ(display.watcher.lists, 1);
+}
+
+TEST(Reset, KeepsTheEditStateOnRequest) {
+    Display display(3, 1);
+    display.simulation->SimulationOpen = display.simulation->SimulationDirty = true;
+    display.simulation->Dimmed = 50;
+    ZephGlobalReset(true, *display.simulation, display.watcher);
+    EXPECT_TRUE(display.simulation->SimulationOpen);
+    EXPECT_EQ(display.watcher.selections, 0);
+    EXPECT_EQ(display.simulation->FixtureCount, 0);
+    EXPECT_EQ(display.simulation->Fixtures[1], ZephFixture{});
+    EXPECT_EQ(display.simulation->Levels[1].Name, "Level 1");
+    EXPECT_EQ(display.simulation->Dimmed, 0);
+    ZephGlobalReset(false, *display.simulation, display.watcher);
+    EXPECT_FALSE(display.simulation->SimulationOpen);
+    EXPECT_EQ(display.watcher.clipboards, 1);
+}
+
+TEST(NewFixtureName, IsTheFirstFreeOneByExactCase) {
+    Display display(3, 0);
+    display.simulation->Fixtures[1].Name = "New Fixture 1";
+    display.simulation->Fixtures[2].Name = "new fixture 2";
+    EXPECT_EQ(ZephReturnNewFixtureName(*display.simulation), "New Fixture 2");
+}
+
+TEST(FixturesPerChannel, WarnsAtSixteenInTheGivenWords) {
+    Display display(16, 0);
+    ZephFixture edited;
+    edited.ChannelCount = 2;
+    edited.Channels[2].Name = "Roof";
+    edited.Channels[2].DeviceType = kDeviceQen;
+    edited.Channels[2].Network = 2;
+    edited.Channels[2].Controller = 3;
+    edited.Channels[2].Channel = 4;
+    // The bound of the search is the count of fixture 2, since the channel in question is the second.
+    display.simulation->Fixtures[2].ChannelCount = 1;
+    for (int f = 1; f <= 15; ++f)
+        display.simulation->Fixtures[f].Channels[1] = edited.Channels[2];
+    RecordingHost host;
+    ZephCheckFixturesPerChannel(*display.simulation, edited, host);
+    EXPECT_TRUE(host.boxes.empty());
+
+    display.simulation->Fixtures[1000].Channels[1] = edited.Channels[2];  // beyond the count, and still counted
+    ZephCheckFixturesPerChannel(*display.simulation, edited, host);
+    ASSERT_EQ(host.boxes.size(), 1u);
+    EXPECT_EQ(host.boxes[0].title, "Qen Visualizer-Max Simulation Fixtures");
+    EXPECT_EQ(host.boxes[0].text,
+              "This channel...\r\n\r\nName:Roof\r\nDevice:Qen\r\nNet:Aux B\r\nUnit:3\r\nCircuit:4\r\n\r\n"
+              "...is in use by more than 16 fixtures.\r\n\r\n"
+              "Your data will be saved, however only the first 16 fixtures will be simulated.");
+
+    display.simulation->Fixtures[2].ChannelCount = 0;
+    host.boxes.clear();
+    ZephCheckFixturesPerChannel(*display.simulation, edited, host);
+    EXPECT_TRUE(host.boxes.empty());
+}
+
+TEST(Identity, X10AddressesReadAsHouseAndUnit) {
+    EXPECT_EQ(ZephReturnX10HouseCode(0) + ZephReturnX10UnitCode(0), "A1");
+    EXPECT_EQ(ZephReturnX10HouseCode(255) + ZephReturnX10UnitCode(255), "P16");
+}
+
+TEST(Tables, RibbonResolutionsKeepTheirUnevenRow) {
+    ZephFixture fixture;
+    fixture.Kesh.Resolution = 5;
+    EXPECT_EQ(KeshResolutionToResolutionCount(3), 17);
+    EXPECT_EQ(KeshResolutionCountToResolution(fixture, 16), 3);
+    EXPECT_EQ(KeshResolutionCountToResolution(fixture, 17), 2);
+    EXPECT_EQ(KeshResolutionCountToResolution(fixture, 3), 5);
+    EXPECT_EQ(KeshResolutionToResolutionCount(8), 50);
+    EXPECT_EQ(networkName(15), "Aux O");
+    EXPECT_EQ(universeName(999), "Unv 999");
+}
+
+TEST(DataDirectories, FollowTheMostRecentFiles) {
+    const ZephPathService paths("/tmp/base");
+    ZephSettings settings;
+    EXPECT_EQ(ZephReturnDataDirectory(1, paths, settings), "/tmp/base/Editor/");
+    EXPECT_EQ(ZephReturnDataDirectory(4, paths, settings), "/tmp/base/Curves/");
+    EXPECT_EQ(ZephReturnDataDirectory(5, paths, settings), "");
+    settings.RecentFiles[0] = "/home/me/house.zee";
+    EXPECT_EQ(ZephReturnDataDirectory(1, paths, settings), "/home/me/");
+}
