@@ -1,0 +1,101 @@
+#include "link/frame_writer.h"
+#include "util/failure.h"
+
+#include <gtest/gtest.h>
+
+namespace {
+
+// The text between SOH and EOT as a frame.
+std::string framed(std::string_view body) {
+    return "\x01" + std::string(body) + "\x04";
+}
+
+}  // namespace
+
+TEST(FrameWriter, WritesACommandColumnByColumn) {
+    FrameWriter writer;
+    writer.command({.Network = 1, .DeviceType = 0, .Unit = 2, .Circuit = 5},
+                   {.Duration = 15, .StartIntensity = 100, .EndIntensity = 0});
+    EXPECT_EQ(writer.payloadCount(), 1);
+    EXPECT_EQ(writer.size(), 38u);
+    EXPECT_EQ(writer.takeFrame(), framed("001"        // payloads
+                                         "0036"       // 7 + 29
+                                         "00"         // cmd: light command
+                                         "00"         // sub: plain
+                                         "001"        // network
+                                         "00"         // device type
+                                         "002"        // unit
+                                         "005"        // circuit
+                                         "0001.500"   // duration, hundredths of a second
+                                         "100000"));  // start and end level
+    EXPECT_EQ(writer.payloadCount(), 0);
+    EXPECT_EQ(writer.takeFrame(), framed("0000007"));
+}
+
+TEST(FrameWriter, WritesNamesDumpsAndNoOperations) {
+    FrameWriter writer;
+    writer.namedCommand(0, "arch_1", {.Duration = 500, .EndIntensity = 100});
+    writer.command({.EffectType = 3, .Network = 1, .Unit = 2, .Circuit = 7},
+                   {.StartIntensity = 255, .EndIntensity = 128});
+    EXPECT_EQ(writer.takeFrame(), framed("0020071"
+                                         "0000000000000060050.000000100arch_1"
+                                         "0003001000020070000.000255128"));
+    const std::uint8_t levels[] = {0xFF, 0x80, 0x00};
+    writer.dmxDump(5, levels);
+    writer.controllerDump(15, 240, levels);
+    writer.noOperation();
+    EXPECT_EQ(writer.takeFrame(), framed("0030053"
+                                         "010000507000003FF8000"
+                                         "010001501240003FF8000"
+                                         "9900"));
+}
+
+TEST(FrameWriter, WritesLongDurationsWithFewerPlaces) {
+    const struct {
+        std::int32_t durationMs;
+        const char* text;
+    } rows[] = {{0, "0000.000"}, {1, "0000.100"}, {99'999, "9999.900"}, {100'000, "010000.0"}, {9'999'999, "999999.9"}};
+    for (const auto& row : rows) {
+        FrameWriter writer;
+        writer.command({.Network = 1}, {.Duration = row.durationMs});
+        EXPECT_EQ(writer.takeFrame().substr(23, 8), row.text) << row.durationMs;
+    }
+}
+
+TEST(FrameWriter, RefusesWhatDoesNotFitAndKeepsTheFrame) {
+    FrameWriter writer;
+    writer.noOperation();
+    const std::uint8_t levels[1000] = {};
+    EXPECT_THROW(writer.command({}, {}), Failure);
+    EXPECT_THROW(writer.command({.EffectType = 4, .Network = 1}, {}), Failure);
+    EXPECT_THROW(writer.command({.Network = 1000}, {}), Failure);
+    EXPECT_THROW(writer.command({.Network = 1}, {.StartIntensity = 101}), Failure);
+    EXPECT_THROW(writer.command({.EffectType = 3, .Network = 1}, {.EndIntensity = 256}), Failure);
+    EXPECT_THROW(writer.command({.Network = 1}, {.Duration = 10'000'000}), Failure);
+    EXPECT_THROW(writer.namedCommand(0, "", {}), Failure);
+    EXPECT_THROW(writer.namedCommand(0, "a\x04", {}), Failure);
+    EXPECT_THROW(writer.dmxDump(0, levels), Failure);
+    EXPECT_THROW(writer.dmxDump(1, levels), Failure);
+    EXPECT_THROW(writer.controllerDump(16, 1, {}), Failure);
+    EXPECT_THROW(writer.controllerDump(0, 241, {}), Failure);
+    EXPECT_EQ(writer.takeFrame(), framed("00100119900"));
+}
+
+TEST(FrameWriter, RefusesAFrameOverTheLimitsOnlyWhenItIsTaken) {
+    FrameWriter writer;
+    for (int i = 0; i < 1000; ++i)
+        writer.noOperation();
+    EXPECT_THROW(writer.takeFrame(), Failure);
+    EXPECT_EQ(writer.payloadCount(), 1000);
+
+    FrameWriter dumps;
+    const std::uint8_t levels[999] = {};
+    for (int i = 0; i < 4; ++i)
+        dumps.dmxDump(1, levels);
+    dumps.dmxDump(1, std::span(levels).first(962));  // 4 x 2013 + 1939 + 7 = 9998
+    EXPECT_EQ(dumps.takeFrame().size(), 10'000u);
+    for (int i = 0; i < 4; ++i)
+        dumps.dmxDump(1, levels);
+    dumps.dmxDump(1, std::span(levels).first(963));  // 10,000
+    EXPECT_THROW(dumps.takeFrame(), Failure);
+}
