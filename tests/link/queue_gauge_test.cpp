@@ -1,0 +1,33 @@
+#include "link/queue_gauge.h"
+#include "util/color.h"
+
+#include <gtest/gtest.h>
+
+TEST(QueueGauge, ColoursByRatioAndSendsAColourOnlyWhenItChanges) {
+    constexpr std::int32_t green = packColor(0, 255, 0);
+    constexpr std::int32_t yellow = packColor(255, 255, 0);
+    constexpr std::int32_t red = packColor(255, 0, 0);
+    const struct {
+        std::size_t length;
+        std::optional<std::int32_t> color;
+        std::int32_t value;
+    } rows[] = {
+        {0, green, 0},
+        {1'468'006, std::nullopt, 1'468'006},  // 0.69999980
+        {1'468'007, yellow, 1'468'007},        // 0.70000029
+        {1'887'436, std::nullopt, 1'887'436},  // 0.89999962
+        {1'887'437, red, 1'887'437},           // 0.90000010
+        {2'097'153, std::nullopt, 2'097'152},  // clamped
+        {5'000'000'000, std::nullopt, 2'097'152},
+        {7, green, 7},
+    };
+    QueueGauge gauge;
+    for (const auto& row : rows) {
+        const QueueGaugeUpdate update = ZephUpdateQueueGauge(row.length, false, gauge);
+        EXPECT_EQ(update.color, row.color) << row.length;
+        EXPECT_EQ(update.value, row.value) << row.length;
+    }
+    const QueueGaugeUpdate silent = ZephUpdateQueueGauge(2'000'000, true, gauge);
+    EXPECT_FALSE(silent.color || silent.value);
+    EXPECT_FALSE(ZephUpdateQueueGauge(8, false, gauge).color);  // what OpenGL hid was not sent
+}
