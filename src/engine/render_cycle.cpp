@@ -136,16 +136,17 @@ void countTick(std::int32_t nowMs, std::int32_t delta, ZephRenderClocks& clocks)
     clocks.ShimmerClock += delta;
 }
 
-void renderFrame(std::int32_t nowMs, const FrameServices& services, RenderContext& context) {
-    services.expandDumps();
-    ZephRenderLights(nowMs, context);
-    context.clocks.FrameClock = 0;
-    ++context.clocks.FrameCount;
-    services.frameDone();
+void renderFrame(std::int32_t nowMs, const TickContext& tick) {
+    ZephProcessDmxStreams(tick.sink, tick.run.failures, tick.stream.Dumps);
+    ZephProcessKeshStreams(tick.sink, tick.run.failures, tick.stream.Dumps);
+    ZephRenderLights(nowMs, tick.run);
+    tick.run.clocks.FrameClock = 0;
+    ++tick.run.clocks.FrameCount;
+    tick.frameDone();
 }
 
-bool secondOver(const FrameServices& services, const ZephRenderClocks& clocks) {
-    return services.clock.timeGetTime() - clocks.SecondStart > kSecondMs;
+bool secondOver(const TickContext& tick) {
+    return tick.clock.timeGetTime() - tick.run.clocks.SecondStart > kSecondMs;
 }
 
 }  // namespace
@@ -169,36 +170,43 @@ void ZephRenderLights(std::int32_t nowMs, RenderContext& context) try {
 }
 ZEPH_GUARD(context.failures, kModule, )
 
-bool ZephRenderingSupervisor(bool force, const FrameServices& services, RenderContext& context) {
-    ZephRenderClocks& clocks = context.clocks;
-    const std::int32_t nowMs = services.clock.timeGetTime();
+bool ZephRenderTick(int renderEngine, const TickContext& tick) {
+    ZephProcessPayloads(true, tick.parser, tick.sink, tick.run.failures, tick.stream);
+    return renderEngine == kEngineOpenGL ? ZephRenderingSupervisorGL(tick) : ZephRenderingSupervisor(false, tick);
+}
+
+bool ZephRenderingSupervisor(bool force, const TickContext& tick) {
+    ZephRenderClocks& clocks = tick.run.clocks;
+    const std::int32_t nowMs = tick.clock.timeGetTime();
     countTick(nowMs, nowMs - clocks.LastTick, clocks);
+    tick.stream.ZephReceptionCount = 0;
     const bool due = force || clocks.FrameClock >= kStandardFrameMs;
-    if (due) renderFrame(nowMs, services, context);
-    services.host.pumpEvents();
-    if (secondOver(services, clocks)) {
-        services.host.setStatusPanel(kFramesPanel, "FPS:" + std::to_string(clocks.FrameCount) + " Res Free:" +
-                                                       std::to_string(clocks.TickCount - clocks.FrameCount));
+    if (due) renderFrame(nowMs, tick);
+    tick.host.pumpEvents();
+    if (secondOver(tick)) {
+        tick.host.setStatusPanel(kFramesPanel, "FPS:" + std::to_string(clocks.FrameCount) +
+                                                   " Res Free:" + std::to_string(clocks.TickCount - clocks.FrameCount));
         clocks.TickCount = 0;
         clocks.FrameCount = 0;
-        services.host.pumpEvents();
+        tick.host.pumpEvents();
     }
     return due;
 }
 
-bool ZephRenderingSupervisorGL(const FrameServices& services, RenderContext& context) {
-    ZephRenderClocks& clocks = context.clocks;
-    const std::int32_t nowMs = services.clock.timeGetTime();
+bool ZephRenderingSupervisorGL(const TickContext& tick) {
+    ZephRenderClocks& clocks = tick.run.clocks;
+    const std::int32_t nowMs = tick.clock.timeGetTime();
     const std::int32_t delta = nowMs - clocks.LastTick;
     if (delta < kOpenGLFrameMs) return false;
     countTick(nowMs, delta, clocks);
-    renderFrame(nowMs, services, context);
-    if (secondOver(services, clocks)) {
-        services.host.setStatusPanel(kFramesPanel, "FPS:" + std::to_string(clocks.FrameCount));
+    tick.stream.ZephReceptionCount = 0;
+    renderFrame(nowMs, tick);
+    if (secondOver(tick)) {
+        tick.host.setStatusPanel(kFramesPanel, "FPS:" + std::to_string(clocks.FrameCount));
         clocks.TickCount = 0;
         clocks.FrameCount = 0;
     }
-    services.host.pumpEvents();
+    tick.host.pumpEvents();
     return true;
 }
 

@@ -3,6 +3,7 @@
 #pragma once
 
 #include "engine/render_context.h"
+#include "link/payload_parser.h"
 #include "util/clock.h"
 #include "util/host.h"
 
@@ -16,19 +17,24 @@ inline constexpr std::int32_t kOpenGLFrameMs = 15;
 // One render pass at the clock reading of the frame. Nothing in it allocates, logs or reads a clock.
 void ZephRenderLights(std::int32_t nowMs, RenderContext& context);
 
-// What a supervisor needs around the pass.
-struct FrameServices {
+// What a tick needs around the pass: where text comes from and where commands go, and who is told.
+struct TickContext {
     const Clock& clock;
+    const ParserSetup& parser;
     Host& host;
-    // Turns the level dumps that have arrived into commands.
-    const std::function<void()>& expandDumps;
-    // Shows a finished frame.
-    const std::function<void()>& frameDone;
+    CommandSink& sink;
+    ChannelStream& stream;
+    RenderContext& run;
+    const std::function<void()>& frameDone;  // shows a finished frame, before waiting events get their turn
 };
 
-// Pacing. Gives true where a frame was rendered.
-bool ZephRenderingSupervisor(bool force, const FrameServices& services, RenderContext& context);
-bool ZephRenderingSupervisorGL(const FrameServices& services, RenderContext& context);
+// One tick of the timer while simulating: waiting payloads become commands, then the supervisor of the engine
+// (kEngineStandard, kEngineOpenGL) renders a frame if one is due. True where a frame was rendered.
+bool ZephRenderTick(int renderEngine, const TickContext& tick);
+
+// Pacing: a frame every 9 ms of render time, or every 15. Level dumps become commands when a frame is drawn.
+bool ZephRenderingSupervisor(bool force, const TickContext& tick);
+bool ZephRenderingSupervisorGL(const TickContext& tick);
 
 // The clock fields as they stand at entry into simulation.
 ZephRenderClocks clocksAtEntry(std::int32_t nowMs);

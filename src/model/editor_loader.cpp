@@ -104,6 +104,7 @@ template <typename Node>
 BodyResult readThroughGate(const Node& root, const ZephSettings& settings, const ZephPathService& paths,
                            FailureReport& failures, ZephSimulation& simulation) {
     const std::string version = root.text("zephSaveFileVersion").value_or("");
+    simulation.zephSaveFileVersion = version;
     const auto row = std::find_if(kVersions.begin(), kVersions.end(),
                                   [&](const VersionRow& known) { return known.version == version; });
     if (row == kVersions.end()) return {};

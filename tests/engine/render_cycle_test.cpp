@@ -248,23 +248,53 @@ TEST(Supervisor, PacesFramesAndTellsTheirRate) {
     rig.addPlain(1, 1);
     rig.build();
     ManualClock clock(EngineRig::kStart);
-    int dumps = 0;
     int shown = 0;
-    const std::function<void()> expand = [&] { ++dumps; };
     const std::function<void()> done = [&] { ++shown; };
-    const FrameServices services{clock, rig.host, expand, done};
-    RenderContext context = rig.context();
+    const ParserSetup parser;
+    RenderTableSink sink(rig.tables, clock);
+    ChannelStream stream;
+    RenderContext run = rig.context();
+    const TickContext tick{clock, parser, rig.host, sink, stream, run, done};
     for (int t = 5; t <= 1010; t += 5) {
         clock.set(EngineRig::kStart + t);
-        ZephRenderingSupervisor(false, services, context);
+        ZephRenderTick(kEngineStandard, tick);
     }
     EXPECT_EQ(shown, 101) << "every second tick of 5 ms";
-    EXPECT_EQ(dumps, shown);
     EXPECT_EQ(rig.host.panels[3], "FPS:101 Res Free:101");
 
     rig.clocks = clocksAtEntry(EngineRig::kStart);
     clock.set(EngineRig::kStart + 14);
-    EXPECT_FALSE(ZephRenderingSupervisorGL(services, context));
+    EXPECT_FALSE(ZephRenderTick(kEngineOpenGL, tick));
     clock.set(EngineRig::kStart + 15);
-    EXPECT_TRUE(ZephRenderingSupervisorGL(services, context));
+    EXPECT_TRUE(ZephRenderTick(kEngineOpenGL, tick));
+}
+
+TEST(Tick, TextBecomesCommandsAtOnceAndDumpsWhenAFrameIsDrawn) {
+    EngineRig rig;
+    rig.addPlain(2, 5);
+    ZephChannel& dmx = rig.addChannel(1, 0, 2);
+    dmx.DeviceType = kDeviceDmx;
+    dmx.Network = 5;
+    rig.build();
+    ManualClock clock(EngineRig::kStart);
+    const std::function<void()> done = [] {};
+    ParserSetup parser;
+    ZephSetUpPacketParms(parser.PacketParms);
+    RenderTableSink sink(rig.tables, clock);
+    ChannelStream stream;
+    stream.ZephStackBuffer.append("\x01"
+                                  "00100360000000010020050001.500100000\x04");
+    stream.ZephStackBuffer.append("\x01"
+                                  "0010019010000507000002FF80\x04");
+    RenderContext run = rig.context();
+    const TickContext tick{clock, parser, rig.host, sink, stream, run, done};
+    clock.set(EngineRig::kStart + 5);
+    EXPECT_FALSE(ZephRenderTick(kEngineStandard, tick));
+    EXPECT_EQ(rig.tables.CommandActive[1], 1);
+    EXPECT_EQ(rig.tables.Live[1].Duration, 15);
+    EXPECT_EQ(rig.tables.CommandActive[2], 0);
+    clock.set(EngineRig::kStart + 9);
+    EXPECT_TRUE(ZephRenderTick(kEngineStandard, tick));
+    EXPECT_EQ(rig.tables.CommandActive[2], 1);
+    EXPECT_EQ(rig.tables.Live[2].EndIntensity, 50);
 }
