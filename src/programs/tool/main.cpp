@@ -1,3 +1,4 @@
+#include "programs/tool/demo_show_command.h"
 #include "programs/tool/info_command.h"
 #include "programs/tool/options.h"
 #include "programs/tool/table_command.h"
@@ -15,6 +16,7 @@ namespace {
 int runCommand(const ToolOptions& options) {
     if (options.command == "info") return runInfo(options);
     if (options.command == "table") return runTable(options);
+    if (options.command == "demo-show") return runDemoShow(options);
     return runTrace(options);
 }
 

@@ -6,14 +6,6 @@
 
 namespace {
 
-struct Compiled {
-    std::unique_ptr<ToolDocument> document;
-    std::unique_ptr<ZephFixtureStates> states = std::make_unique<ZephFixtureStates>();
-    ZephRenderTables tables;
-
-    bool ok() const { return tables.RenderDataCount > 0; }
-};
-
 QJsonObject slotJson(const ZephRenderSlot& slot) {
     return {{"Fixture", slot.Fixture},    {"Channel", slot.Channel},   {"Level", slot.Level},
             {"IsRGB", slot.isRGB()},      {"RGBIndex", slot.RGBIndex}, {"Triplet", slot.Triplet},
@@ -32,7 +24,7 @@ QJsonObject entryJson(const ZephRenderData& entry, const ZephRenderTables& table
     return {{"Key", entry.Key}, {"Levels", levels}, {"Slots", slotList}};
 }
 
-QJsonArray locationsJson(const Compiled& compiled) {
+QJsonArray locationsJson(const CompiledDocument& compiled) {
     QJsonArray locations;
     for (int f = 1; f <= compiled.document->simulation->FixtureCount; ++f) {
         const ZephFixtureState& state = (*compiled.states)[f];
@@ -49,7 +41,7 @@ QJsonArray locationsJson(const Compiled& compiled) {
     return locations;
 }
 
-QJsonObject tableJson(const Compiled& compiled) {
+QJsonObject tableJson(const CompiledDocument& compiled) {
     const ZephRenderTables& tables = compiled.tables;
     QJsonArray names;
     for (std::size_t n = 1; n < tables.VirtualChannels.size(); ++n)
@@ -69,7 +61,7 @@ QJsonObject tableJson(const Compiled& compiled) {
             {"BulbLocations", locationsJson(compiled)}};
 }
 
-void printTable(const Compiled& compiled) {
+void printTable(const CompiledDocument& compiled) {
     const ZephRenderTables& tables = compiled.tables;
     std::printf("%d channel keys, %zu RGB groups, %d virtual channels, %zu bulbs\n", tables.RenderDataCount,
                 tables.RGBData.empty() ? 0 : tables.RGBData.size() - 1, tables.VirtualChannelCount,
@@ -92,12 +84,7 @@ void printTable(const Compiled& compiled) {
 }  // namespace
 
 int runTable(const ToolOptions& options) {
-    Compiled compiled{.document = loadToolDocument(options.file)};
-    ToolDocument& document = *compiled.document;
-    if (document.loaded) {
-        ZephBuildRenderTable({document.settings, document.host, document.failures, *document.simulation,
-                              *compiled.states, compiled.tables});
-    }
+    const CompiledDocument compiled = compileToolDocument(options.file);
     if (options.json) {
         printJson(tableJson(compiled));
     } else {

@@ -21,3 +21,13 @@ std::unique_ptr<ToolDocument> loadToolDocument(const std::string& file) {
     document->loaded = ZephLoadVisualizerXML(true, context, simulation);
     return document;
 }
+
+CompiledDocument compileToolDocument(const std::string& file) {
+    CompiledDocument compiled{.document = loadToolDocument(file)};
+    ToolDocument& document = *compiled.document;
+    if (document.loaded) {
+        ZephBuildRenderTable({document.settings, document.host, document.failures, *document.simulation,
+                              *compiled.states, compiled.tables});
+    }
+    return compiled;
+}

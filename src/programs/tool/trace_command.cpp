@@ -48,10 +48,9 @@ private:
 }  // namespace
 
 int runTrace(const ToolOptions& options) {
-    const std::unique_ptr<ToolDocument> document = loadToolDocument(options.file);
-    if (!document->loaded) return 1;
-    VirtualRun run(*document, loadCapture(options.capture), options.engine, options.seed);
-    if (!run.enter()) return 1;
+    CompiledDocument display = compileToolDocument(options.file);
+    if (!display.ok()) return 1;
+    VirtualRun run(display, loadCapture(options.capture), options.engine, options.seed);
     TraceSurface surface(options.json);
     run.run(*options.until, surface, [&](std::int32_t t) {
         surface.print(t);

@@ -1,17 +1,10 @@
 #include "programs/tool/virtual_run.h"
 
-VirtualRun::VirtualRun(ToolDocument& document, Capture capture, const std::string& engine, std::uint64_t seed)
-    : document_(document), capture_(std::move(capture)), engine_(engine == "opengl" ? kEngineOpenGL : kEngineStandard),
-      random_(seed) {
-    // Always the identity: a picture must not depend on a curve that happens to lie in somebody's folder.
-    curve_ = ZephCreateDummyDimmingCurve();
-}
-
-bool VirtualRun::enter() {
-    ZephBuildRenderTable(
-        {document_.settings, document_.host, document_.failures, *document_.simulation, *states_, tables_});
-    return tables_.RenderDataCount > 0;
-}
+VirtualRun::VirtualRun(CompiledDocument& display, Capture capture, const std::string& engine, std::uint64_t seed)
+    : display_(display), capture_(std::move(capture)), engine_(engine == "opengl" ? kEngineOpenGL : kEngineStandard),
+      random_(seed),
+      // Always the identity: a picture must not depend on a curve that happens to lie in somebody's folder.
+      curve_(ZephCreateDummyDimmingCurve()) {}
 
 void VirtualRun::run(std::int32_t until, LightSurface& surface, const std::function<bool(std::int32_t)>& onFrame) {
     const std::int32_t tickMs = engine_ == kEngineOpenGL ? kOpenGLFrameMs : kStandardFrameMs;
@@ -19,13 +12,14 @@ void VirtualRun::run(std::int32_t until, LightSurface& surface, const std::funct
     ZephRenderClocks clocks = clocksAtEntry(kVirtualStartMs);
     ParserSetup parser;
     ZephSetUpPacketParms(parser.PacketParms);
-    RenderTableSink sink(tables_, clock);
+    RenderTableSink sink(display_.tables, clock);
     ChannelStream stream;
-    RenderContext context{*document_.simulation, curve_, tables_, *states_, clocks, random_, surface,
-                          document_.failures};
+    ToolDocument& document = *display_.document;
+    RenderContext context{*document.simulation, curve_, display_.tables, *display_.states, clocks, random_, surface,
+                          document.failures};
     bool drawn = false;
     const std::function<void()> frameDone = [&] { drawn = true; };
-    const TickContext tick{clock, parser, document_.host, sink, stream, context, frameDone};
+    const TickContext tick{clock, parser, document.host, sink, stream, context, frameDone};
 
     std::size_t next = 0;
     for (std::int32_t t = tickMs; t <= until; t += tickMs) {
