@@ -1,0 +1,64 @@
+// What every benchmark hands its figures to, and how they are taken: rows of times in groups, whose first row is the
+// one that the others are compared with, and the goals that the program holds itself to.
+#pragma once
+
+#include <algorithm>
+#include <chrono>
+#include <string>
+#include <vector>
+
+class BenchReport {
+public:
+    struct Row {
+        std::string group;
+        std::string name;
+        double microseconds;
+    };
+    struct Goal {
+        std::string name;
+        std::string figure;
+        std::string goal;
+        bool met;
+    };
+
+    void row(std::string group, std::string name, double microseconds) {
+        rows.push_back({std::move(group), std::move(name), microseconds});
+    }
+    void goal(std::string name, std::string figure, std::string goalText, bool met) {
+        goals.push_back({std::move(name), std::move(figure), std::move(goalText), met});
+    }
+
+    std::vector<Row> rows;
+    std::vector<Goal> goals;
+};
+
+// The median time of `runs` calls, in microseconds. Before each, `prepare` runs outside the clock. runs is at least 1.
+template <typename Prepare, typename Work>
+double medianMicroseconds(int runs, Prepare prepare, Work work) {
+    using SteadyClock = std::chrono::steady_clock;
+    std::vector<double> times;
+    for (int run = 0; run < runs; ++run) {
+        prepare();
+        const SteadyClock::time_point start = SteadyClock::now();
+        work();
+        times.push_back(std::chrono::duration<double, std::micro>(SteadyClock::now() - start).count());
+    }
+    const auto middle = times.begin() + static_cast<std::ptrdiff_t>(times.size() / 2);
+    std::nth_element(times.begin(), middle, times.end());
+    return *middle;
+}
+
+template <typename Work>
+double medianMicroseconds(int runs, Work work) {
+    return medianMicroseconds(
+        runs, [] {}, work);
+}
+
+// Keeps the compiler from dropping work whose result nothing reads.
+template <typename T>
+void keepResult(const T& value) {
+    asm volatile("" : : "g"(&value) : "memory");
+}
+
+// One a bench file, called by main in this order.
+void benchLoad(BenchReport& report);

@@ -1,0 +1,3 @@
+#include "bench/bench_report.h"
+
+void benchLoad(BenchReport&) {}
