@@ -200,4 +200,6 @@ struct ZephSimulation {
     // Stands in for a channel without LED of its own. It outlives loads on purpose: an old file sets it, and every
     // later file that says nothing inherits it.
     bool FixtureLedDefault = false;
+
+    bool operator==(const ZephSimulation&) const = default;
 };
