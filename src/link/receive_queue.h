@@ -12,8 +12,17 @@
 
 class ReceiveQueue {
 public:
-    // The reader's side: appends bytes behind what waits.
-    void put(std::string_view bytes);
+    enum class HandOver { Nothing, Done, Busy };
+
+    ReceiveQueue() { filling_.reserve(kBlockBytes); }
+
+    // The reader's side: appends bytes to its own block, which nobody else sees.
+    void put(std::string_view bytes) { filling_.append(bytes); }
+    // Hands the block over, if it holds bytes. Busy, with the block kept, where the other side is just taking: the
+    // reader must not wait for it, since the system may have put that thread aside in the middle of it.
+    HandOver tryHandOver();
+    // The same, waiting for the other side; for the end.
+    void handOver();
 
     // The other side: replaces text by the first block that waits, empty when none does. text's own storage is kept
     // for reuse.
@@ -23,7 +32,10 @@ private:
     static constexpr std::size_t kBlockBytes = 1 << 20;
     static constexpr std::size_t kMostSpare = 4;
 
-    std::mutex guard_;
+    void handOverLocked();
+
+    std::string filling_;  // the reader's
+    std::mutex guard_;     // of what follows
     std::deque<std::string> waiting_;
     std::vector<std::string> spare_;
 };

@@ -49,7 +49,10 @@ protected:
     virtual void serve() = 0;               // until stopping()
 
     bool stopping() const { return stopping_; }
-    void arrived(std::string_view bytes);
+    // Bytes for the owner: gathered, then told together. tellGathered returns how long the thread may wait for more,
+    // ms: a short time where the owner was just reading and must be told again.
+    void gather(std::string_view bytes) { queue_.put(bytes); }
+    int tellGathered();
     void requested(std::int64_t requestID);
 
 private:
