@@ -62,3 +62,4 @@ void keepResult(const T& value) {
 
 // One a bench file, called by main in this order.
 void benchLoad(BenchReport& report);
+void benchParser(BenchReport& report);

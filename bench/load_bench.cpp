@@ -19,15 +19,6 @@ namespace {
 
 constexpr int kRuns = 9;
 
-class NoWatcher : public DocumentWatcher {
-    void selectionCleared() override {}
-    void fixtureRemoved(int) override {}
-    void objectListChanged() override {}
-    void canvasChanged() override {}
-    void editSessionReset() override {}
-    void clipboardAndStatusCleared() override {}
-};
-
 std::string ratioText(double value) {
     char text[32];
     std::snprintf(text, sizeof text, "%.2f x", value);

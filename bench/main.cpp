@@ -38,6 +38,7 @@ int main(int count, char** arguments) {
     }
     BenchReport report;
     benchLoad(report);
+    benchParser(report);
     if (!goalsOnly) printRows(report);
     printGoals(report);
     return 0;

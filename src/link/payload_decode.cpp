@@ -168,41 +168,6 @@ __attribute__((target("sse4.1"))) std::size_t decodeSse41(std::string_view text,
     return fits;
 }
 
-__attribute__((target("avx2"))) inline __m256i loadPair(const void* low, const void* high) noexcept {
-    return _mm256_loadu2_m128i(static_cast<const __m128i*>(high), static_cast<const __m128i*>(low));
-}
-
-__attribute__((target("avx2"))) std::size_t decodeAvx2(std::string_view text, std::size_t most,
-                                                       ZephChannelCommand* out) noexcept {
-    const __m256i zeroDigit = _mm256_set1_epi8('0');
-    const __m256i nine = _mm256_set1_epi8(9);
-    const __m256i point = _mm256_set1_epi8('.' - '0');
-    const __m256i weights = loadPair(kFieldWeights, kTimingWeights);
-    const __m256i pairs = loadPair(kFieldPairs, kTimingPairs);
-    const __m256i addressLanes = _mm256_setr_epi32(-1, -1, -1, 0, 0, 0, 0, 0);
-    const std::size_t fits = std::min(most, text.size() / kChars);
-    for (std::size_t n = 0; n < fits; ++n) {
-        const char* const payload = text.data() + n * kChars;
-        std::int32_t sub = 0;
-        if (!isLightHead(payload, sub)) return n;
-        const __m256i halves = _mm256_sub_epi8(loadPair(payload, payload + 13), zeroDigit);
-        const auto digits =
-            static_cast<unsigned>(_mm256_movemask_epi8(_mm256_cmpeq_epi8(_mm256_min_epu8(halves, nine), halves)));
-        const auto points = static_cast<unsigned>(_mm256_movemask_epi8(_mm256_cmpeq_epi8(halves, point)));
-        unsigned pointAt = 0;
-        if ((digits & kAddressDigits) != kAddressDigits) return n;
-        if (!isTimingGood(~digits >> 16, points >> 16, pointAt)) return n;
-        const __m256i shuffled = _mm256_shuffle_epi8(halves, loadPair(kAddressShuffle, kTimingShuffles.rows[pointAt]));
-        const __m256i values = _mm256_madd_epi16(_mm256_maddubs_epi16(shuffled, weights), pairs);
-        if (_mm256_testz_si256(values, addressLanes)) return n;
-        _mm_storeu_si128(reinterpret_cast<__m128i*>(&out[n].Command.Network), _mm256_castsi256_si128(values));
-        const __m128i timing = _mm256_extracti128_si256(values, 1);
-        putCommand(sub, pointAt, static_cast<std::uint64_t>(_mm_cvtsi128_si64(timing)),
-                   static_cast<std::uint64_t>(_mm_extract_epi64(timing, 1)), out[n]);
-    }
-    return fits;
-}
-
 #endif
 
 }  // namespace
@@ -210,7 +175,6 @@ __attribute__((target("avx2"))) std::size_t decodeAvx2(std::string_view text, st
 bool hasDecodeForm(DecodeForm form) noexcept {
 #ifdef ZEPH_X86_FORMS
     if (form == DecodeForm::Sse41) return __builtin_cpu_supports("sse4.1");
-    if (form == DecodeForm::Avx2) return __builtin_cpu_supports("avx2");
 #endif
     return form == DecodeForm::Plain;
 }
@@ -218,12 +182,10 @@ bool hasDecodeForm(DecodeForm form) noexcept {
 DecodeRun decodeRunOf(DecodeForm form) noexcept {
 #ifdef ZEPH_X86_FORMS
     if (form == DecodeForm::Sse41) return decodeSse41;
-    if (form == DecodeForm::Avx2) return decodeAvx2;
 #endif
     return decodePlain;
 }
 
 DecodeForm fastestDecodeForm() noexcept {
-    if (hasDecodeForm(DecodeForm::Avx2)) return DecodeForm::Avx2;
     return hasDecodeForm(DecodeForm::Sse41) ? DecodeForm::Sse41 : DecodeForm::Plain;
 }

@@ -12,10 +12,10 @@
 // `out` and returns how many it wrote; those took 29 characters each. Reads within text only.
 using DecodeRun = std::size_t (*)(std::string_view text, std::size_t most, ZephChannelCommand* out) noexcept;
 
+// Both halves in one 32-byte register were measured as well and gained nothing.
 enum class DecodeForm {
     Plain,  // character by character, on every processor
     Sse41,  // two 16-byte loads a payload
-    Avx2,   // both halves of a payload in one register
 };
 
 // Whether this processor can run the form.

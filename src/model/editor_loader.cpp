@@ -127,15 +127,6 @@ void emptyForFile(ZephSimulation& simulation, DocumentWatcher& watcher) {
     simulation.Background.EditorHeightTwips = 0;
 }
 
-class NoWatcher : public DocumentWatcher {
-    void selectionCleared() override {}
-    void fixtureRemoved(int) override {}
-    void objectListChanged() override {}
-    void canvasChanged() override {}
-    void editSessionReset() override {}
-    void clipboardAndStatusCleared() override {}
-};
-
 // The quick form reads into a document of its own, since a text can turn out unusual at its very end. Nothing then.
 std::optional<BodyResult> readQuickly(const SourceText& text, PendingChecksum& checksum,
                                       const EditorFileContext& context, ZephSimulation& simulation) {

@@ -4,21 +4,27 @@
 #include "model/editor_elements.h"
 #include "util/whole_file.h"
 
+#include <algorithm>
+
 namespace {
 
 constexpr std::string_view kSaveModule = "modZephLoadSave";
 constexpr std::string_view kRootTag = "<Zeph";
+
+std::size_t upTo(std::int32_t count, int max) {
+    return static_cast<std::size_t>(std::clamp(count, 0, max));
+}
 
 // What the text will need at most in ordinary cases, so that it grows without being moved.
 std::size_t expectedSize(const ZephSimulation& simulation) {
     constexpr std::size_t kHead = 8192, kProp = 512, kMember = 64, kFixture = 1024, kChannel = 384, kPoint = 80;
     std::size_t size = kHead;
     for (int p = 1; p <= simulation.PropCount; ++p)
-        size += kProp + kMember * static_cast<std::size_t>(simulation.Props[p].AssignedCount);
+        size += kProp + kMember * upTo(simulation.Props[p].AssignedCount, kMaxFixturesInProp);
     for (int f = 1; f <= simulation.FixtureCount; ++f) {
         const ZephFixture& fixture = simulation.Fixtures[f];
-        size += kFixture + kChannel * static_cast<std::size_t>(fixture.ChannelCount) +
-                kPoint * static_cast<std::size_t>(fixture.PointCount);
+        size += kFixture + kChannel * upTo(fixture.ChannelCount, kMaxChannels) +
+                kPoint * upTo(fixture.PointCount, kMaxPoints);
     }
     return size;
 }
@@ -26,6 +32,8 @@ std::size_t expectedSize(const ZephSimulation& simulation) {
 }  // namespace
 
 std::string editorText(const ZephSimulation& simulation, const ZephPathService& paths, std::string_view createdAt) {
+    require(simulation.PropCount <= kMaxProps && simulation.FixtureCount <= kMaxFixtures,
+            "A count of the document is beyond its table");
     XmlText text(expectedSize(simulation));
     CreateProcessingInstructions(text);
     CreateTopNode("Zeph", kFileVersion, createdAt, text);

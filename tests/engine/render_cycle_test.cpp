@@ -285,7 +285,7 @@ TEST(Tick, TextBecomesCommandsAtOnceAndDumpsWhenAFrameIsDrawn) {
     stream.ZephStackBuffer.append("\x01"
                                   "00100360000000010020050001.500100000\x04");
     stream.ZephStackBuffer.append("\x01"
-                                  "0010019010000507000002FF80\x04");
+                                  "0010026010000507000002FF80\x04");
     RenderContext run = rig.context();
     const TickContext tick{clock, parser, rig.host, sink, stream, run, done};
     clock.set(EngineRig::kStart + 5);

@@ -68,7 +68,7 @@ void mutate(SeededRandom& random, std::string& text) {
 }  // namespace
 
 TEST(ParserForms, EveryFormReadsRandomAndDamagedStreamsAsThePlainParserDoes) {
-    for (const DecodeForm form : {DecodeForm::Plain, DecodeForm::Sse41, DecodeForm::Avx2}) {
+    for (const DecodeForm form : {DecodeForm::Plain, DecodeForm::Sse41}) {
         if (!hasDecodeForm(form)) continue;
         SeededRandom random(17);
         CollectingFailures failures;

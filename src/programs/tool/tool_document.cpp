@@ -23,7 +23,8 @@ std::unique_ptr<ToolDocument> loadToolDocument(const std::string& file) {
 }
 
 CompiledDocument compileToolDocument(const std::string& file) {
-    CompiledDocument compiled{.document = loadToolDocument(file)};
+    CompiledDocument compiled;
+    compiled.document = loadToolDocument(file);
     ToolDocument& document = *compiled.document;
     if (document.loaded) {
         ZephBuildRenderTable({document.settings, document.host, document.failures, *document.simulation,

@@ -1,0 +1,186 @@
+#include "link/communications.h"
+#include "tests/support/list_socket.h"
+#include "tests/support/recording_host.h"
+
+#include <gtest/gtest.h>
+
+namespace {
+
+struct Communications : testing::Test {
+    bool setUp() { return ZephSetUpCommunications(context, connection, adapters, ip, port); }
+
+    ListSocket socket;
+    RecordingHost host;
+    CollectingFailures failures;
+    std::vector<ZephAdapter> machine{{"eth0", "192.168.1.20"}, {"wlan0", "0.0.0.0"}};
+    std::vector<std::string> log;
+    CommunicationsContext context{socket, [this] { return machine; }, host, failures,
+                                  [this](std::string_view line) { log.emplace_back(line); }};
+    Connection connection;
+    ZephAdapters adapters;
+    std::string ip;
+    std::string port;
+};
+
+using Strings = std::vector<std::string>;
+
+}  // namespace
+
+TEST_F(Communications, UdpBindsTheChosenAdapterOnceAndTunesTheBufferOnEachCall) {
+    connection.ZephAdapterName = "eth0";
+    EXPECT_TRUE(setUp());
+    EXPECT_TRUE(connection.ZephPortOpen);
+    EXPECT_EQ(simulationActiveText(false, ip, port), "UDP Simulation active on 192.168.1.20 (30303)");
+    connection.ZephSimulationPort = 5;  // takes effect with the next start of the program
+    EXPECT_TRUE(setUp());
+    EXPECT_EQ(simulationActiveText(false, ip, port), "UDP Simulation active on 192.168.1.20 (30303)");
+    EXPECT_EQ(socket.calls, (Strings{"bind 192.168.1.20 30303", "buffer 2097152", "buffer 2097152"}));
+    EXPECT_EQ(log, Strings(2, "Receive buffer: 2097152 bytes asked for, 212992 granted"));
+    EXPECT_TRUE(host.boxes.empty());
+}
+
+TEST_F(Communications, AnUnknownAdapterFallsBackToLocalAndTcpListensOnAllAddresses) {
+    connection.ZephAdapterName = "eth7";
+    connection.ZephUseTCP = true;
+    EXPECT_TRUE(setUp());
+    EXPECT_EQ(simulationActiveText(true, ip, port), "TCP Simulation active on 127.0.0.1 (30303)");
+    EXPECT_EQ(socket.calls.front(), "listen 30303");
+}
+
+TEST_F(Communications, AnAdapterWithoutAnAddressOpensNothing) {
+    connection.ZephAdapterName = "wlan0";
+    EXPECT_FALSE(setUp());
+    ASSERT_EQ(host.boxes.size(), 1u);
+    EXPECT_EQ(host.boxes[0].title, "Qen Visualizer-Port Error");
+    EXPECT_EQ(host.boxes[0].text,
+              "(SetUpCommunications:  No IP)\r\nThere is a problem with your selected network adapter.");
+    EXPECT_EQ(host.boxes[0].icon, BoxIcon::Critical);
+    EXPECT_TRUE(socket.calls.empty());
+    EXPECT_FALSE(connection.ZephPortOpen);
+}
+
+TEST_F(Communications, ATakenPortIsToldReportedAndTriedAgainNextTime) {
+    socket.taken = true;
+    EXPECT_FALSE(setUp());
+    EXPECT_FALSE(connection.ZephPortOpen);
+    ASSERT_EQ(host.boxes.size(), 1u);
+    EXPECT_EQ(host.boxes[0].title, "Qen Visualizer-Port Error");
+    EXPECT_TRUE(host.boxes[0].text.starts_with("Port 30303 is already in use"));
+    ASSERT_EQ(failures.reports.size(), 1u);
+    EXPECT_EQ(failures.reports[0].procedure, "Zeph.modZephCommunications.ZephSetUpCommunications");
+    socket.taken = false;
+    EXPECT_TRUE(setUp());
+}
+
+TEST_F(Communications, AnotherFailureToOpenIsToldInTheSystemsWords) {
+    socket.openFailure = "The address is protected";
+    EXPECT_FALSE(setUp());
+    ASSERT_EQ(host.boxes.size(), 1u);
+    EXPECT_EQ(host.boxes[0].text, "Port 30303 cannot be opened: The address is protected");
+    EXPECT_EQ(failures.reports.size(), 1u);
+}
+
+TEST_F(Communications, ARefusedReceiveBufferIsToldWithTheSystemsNumber) {
+    socket.bufferAnswer = {22, 0};
+    EXPECT_FALSE(setUp());
+    ASSERT_EQ(host.boxes.size(), 1u);
+    EXPECT_EQ(host.boxes[0].text, "Error setting SO_BROADCAST option: 22");
+    EXPECT_TRUE(connection.ZephPortOpen);
+}
+
+TEST_F(Communications, ATcpClientIsAcceptedAndTold) {
+    Winsock1_ConnectionRequest(4, socket, host, failures);
+    EXPECT_EQ(socket.calls, Strings{"accept 4"});
+    EXPECT_EQ(host.panels[2], "Data connection established");
+}
+
+TEST_F(Communications, ArrivalMovesEverythingAndGaugesTheLengthFromBefore) {
+    ReceiveState receive;
+    socket.reads = {"ab", "c"};
+    socket.failsWhenEmpty = true;
+    EXPECT_EQ(Winsock1_DataArrival(true, false, socket, failures, receive).value, 0);
+    EXPECT_EQ(receive.Stream.ZephStackBuffer.view(), "abc");
+    socket.reads = {"d"};
+    EXPECT_EQ(Winsock1_DataArrival(true, false, socket, failures, receive).value, 3);
+    EXPECT_EQ(receive.Stream.ZephReceptionCount, 2u);
+    socket.reads = {"e"};
+    EXPECT_EQ(Winsock1_DataArrival(false, false, socket, failures, receive).value, 4);
+    EXPECT_TRUE(receive.Stream.ZephStackBuffer.empty());
+    EXPECT_TRUE(failures.reports.empty());
+}
+
+TEST(Adapters, FillTheSlotsInOrderAndTheFirstEqualNameWins) {
+    RecordingHost host;
+    ZephAdapters adapters;
+    const AdapterLister lister = [] {
+        return std::vector<ZephAdapter>{{"eth0", "10.0.0.1"}, {"eth0", "10.0.0.2"}, {"Eth0", "10.0.0.3"}};
+    };
+    EXPECT_EQ(ZephLoadAdaptersAndReturnIP("eth0", lister, host, adapters), "10.0.0.1");
+    EXPECT_EQ(ZephLoadAdaptersAndReturnIP("Eth0", lister, host, adapters), "10.0.0.3");
+    EXPECT_EQ(ZephLoadAdaptersAndReturnIP("", lister, host, adapters), "127.0.0.1");
+    EXPECT_EQ(adapters[1], (ZephAdapter{"Local", "127.0.0.1"}));
+    EXPECT_EQ(adapters[4], (ZephAdapter{"Eth0", "10.0.0.3"}));
+    EXPECT_EQ(adapters[5], ZephAdapter{});
+    EXPECT_EQ(ZephLoadAdaptersAndReturnIP(
+                  "Eth0", [] { return std::vector<ZephAdapter>{}; }, host, adapters),
+              "127.0.0.1");
+    EXPECT_EQ(adapters[2], ZephAdapter{});  // rebuilt, not added to
+}
+
+TEST(Adapters, MoreThanTheSlotsHoldIsTold) {
+    for (const int count : {31, 32, 40}) {
+        RecordingHost host;
+        ZephAdapters adapters;
+        const auto lister = [count] {
+            std::vector<ZephAdapter> machine;
+            for (int i = 1; i <= count; ++i)
+                machine.push_back({"a" + std::to_string(i), "10.0.0." + std::to_string(i)});
+            return machine;
+        };
+        EXPECT_EQ(ZephLoadAdaptersAndReturnIP("a31", lister, host, adapters), "10.0.0.31");
+        ASSERT_EQ(host.boxes.size(), count > 31 ? 1u : 0u) << count;
+        if (count == 31) continue;
+        EXPECT_EQ(host.boxes[0].title, "Qen Visualizer-Error");
+        EXPECT_EQ(host.boxes[0].text,
+                  "Your system has more than 32 network adapters.  Only the first 32 will be used.");
+        EXPECT_EQ(host.boxes[0].icon, BoxIcon::Information);
+    }
+}
+
+TEST(Adapters, TheStartUpCheckChoosesAndWarns) {
+    const AdapterLister lister = [] {
+        return std::vector<ZephAdapter>{{"eth0", "10.0.0.1"}, {"wlan0", "0.0.0.0"}, {"odd", ""}};
+    };
+    const struct {
+        const char* stored;
+        const char* name;
+        const char* ip;
+        const char* boxBegins;  // "" = no box
+    } rows[] = {
+        {"", "Local", "127.0.0.1", ""},
+        {"eth0", "eth0", "10.0.0.1", ""},
+        {"gone", "gone", "127.0.0.1", ""},
+        {"wlan0", "wlan0", "0.0.0.0", "Your network adapter is present, however"},
+        {"odd", "Local", "127.0.0.1", "The previously assigned network adapter no longer exists on this system.\r\n"},
+    };
+    for (const auto& row : rows) {
+        RecordingHost host;
+        ZephAdapters adapters;
+        const AdapterChoice choice = ZephCheckAdapterAtStartup(row.stored, lister, host, adapters);
+        EXPECT_EQ(choice.ZephAdapterName, row.name);
+        EXPECT_EQ(choice.ZephAdapterIP, row.ip);
+        ASSERT_EQ(host.boxes.size(), *row.boxBegins ? 1u : 0u) << row.stored;
+        if (*row.boxBegins) {
+            EXPECT_TRUE(host.boxes[0].text.starts_with(row.boxBegins)) << host.boxes[0].text;
+            EXPECT_EQ(host.boxes[0].icon, BoxIcon::Warning);
+        }
+    }
+}
+
+TEST(Adapters, TheSystemsAdaptersHaveNamesAndAddresses) {
+    for (const ZephAdapter& adapter : listSystemAdapters()) {
+        EXPECT_FALSE(adapter.Name.empty());
+        EXPECT_NE(adapter.IpAddress, "127.0.0.1");
+        EXPECT_FALSE(adapter.IpAddress.empty());
+    }
+}
