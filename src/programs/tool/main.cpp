@@ -1,6 +1,7 @@
 #include "programs/tool/demo_show_command.h"
 #include "programs/tool/info_command.h"
 #include "programs/tool/options.h"
+#include "programs/tool/render_command.h"
 #include "programs/tool/table_command.h"
 #include "programs/tool/trace_command.h"
 
@@ -16,6 +17,7 @@ namespace {
 int runCommand(const ToolOptions& options) {
     if (options.command == "info") return runInfo(options);
     if (options.command == "table") return runTable(options);
+    if (options.command == "render") return runRender(options);
     if (options.command == "demo-show") return runDemoShow(options);
     return runTrace(options);
 }
