@@ -62,3 +62,5 @@ void keepResult(const T& value) {
 
 // One a bench file, called by main in this order.
 void benchLoad(BenchReport& report);
+void benchMasks(BenchReport& report);
+void benchFrame(BenchReport& report);

@@ -38,6 +38,8 @@ int main(int count, char** arguments) {
     }
     BenchReport report;
     benchLoad(report);
+    benchMasks(report);
+    benchFrame(report);
     if (!goalsOnly) printRows(report);
     printGoals(report);
     return 0;
