@@ -3,6 +3,8 @@
 #pragma once
 
 #include "engine/fixture_state.h"
+#include "engine/key_search.h"
+#include "model/settings.h"
 #include "util/failure.h"
 #include "util/host.h"
 
@@ -37,7 +39,7 @@ struct ZephRenderData {
 };
 
 // The live half of an entry: what its channel is doing. In an array of its own, so that filing a command touches one
-// cache line.
+// cache line. Whether a command is active stands in ZephRenderTables::CommandActive, which a pass scans.
 struct ZephRenderLive {
     std::int32_t CommandType = 0;
     std::int32_t EffectType = 0;  // 0 plain, 1 shimmer, 2 twinkle
@@ -47,7 +49,7 @@ struct ZephRenderLive {
     std::int32_t Duration = 0;         // ms
     std::int32_t LastEffectTime = 0;   // 0 before the first effect step
     std::int32_t NextTwinkleTime = 0;  // 0 = not started
-    bool CommandActive = false;
+    std::uint32_t LevelUsed = 0;       // copy of the entry's, so that filing need not look there
     bool NewCommand = false;
     bool TwinkleOn = false;
 };
@@ -63,17 +65,66 @@ struct ZephRGBData {
     std::int32_t Bulb = 0;  // handle of the coloured image, kept by the drawing surface; 0 = none yet
 };
 
+// One RGB group of a level, in the order in which groups are drawn.
+struct ZephLevelGroup {
+    std::int32_t Fixture = 0;
+    std::int32_t RGBIndex = 0;
+    std::int32_t Triplet = 0;
+};
+
 struct ZephRenderTables {
     std::int32_t RenderDataCount = 0;  // 0 until a build has ended well
     std::vector<std::int32_t> Keys;    // ascending; beside RenderData and Live, in the same order
+    KeySearch Search;                  // finds a key's place in Keys
     std::vector<ZephRenderData> RenderData;
     std::vector<ZephRenderLive> Live;
+    std::vector<std::uint8_t> CommandActive;  // 0 or 1: a command runs on the entry
+    std::vector<std::int32_t> NewEntries;     // entries whose NewCommand is set
     std::vector<ZephRenderSlot> Slots;
     std::vector<ZephRGBData> RGBData;
     std::int32_t VirtualChannelCount = 0;
     std::vector<std::string> VirtualChannels;  // lower case UTF-8, ascending once gathered
     bool VirtualChannelWarning = false;
-    std::array<bool, kLevels + 1> LevelChanged{};
+    std::uint32_t LevelChanged = 0;  // bit of the level number: a channel on it has something to show
+    std::array<std::vector<std::int32_t>, kLevels + 1> LevelEntries;   // entries that use a level, in key order
+    std::array<std::vector<ZephLevelGroup>, kLevels + 1> LevelGroups;  // groups of a level, in key order
     std::vector<ZephBulbLocation> BulbPool;
     std::vector<ZephStrobeBulb> StrobePool;
+    std::vector<std::uint8_t> BulbLit;  // as many as the longest flashing channel has bulbs: work space of a pass
 };
+
+// What the compiler of the table reads and changes.
+struct RenderBuildContext {
+    const ZephSettings& settings;
+    Host& host;
+    FailureReport& failures;
+    ZephSimulation& simulation;  // a cleared device is marked in it, and ribbons are assembled
+    ZephFixtureStates& states;
+    ZephRenderTables& tables;
+};
+
+// Compiles the document. RenderDataCount stays 0 when it fails validation (the list of faults was shown) or has no
+// channels (a box said so).
+void ZephBuildRenderTable(RenderBuildContext context);
+
+// Erases the tables. The points that assembly added to main ribbons go with restoreAssembledPoints.
+void eraseRenderTables(ZephRenderTables& tables);
+
+// Gives every main ribbon and pixel fixture that this run assembled its own points back.
+void restoreAssembledPoints(ZephSimulation& simulation, ZephFixtureStates& states);
+
+// Keys of addresses; 0 where the address has none. Decimal packing in 64 bits; what does not fit 32 has no key.
+std::int32_t BuildCmdKey(std::int32_t deviceType, std::int32_t network, std::int32_t unit, std::int32_t circuit);
+std::int32_t BuildKeshRenderKey(std::int32_t network, std::int32_t unit, std::int32_t circuit);
+std::int32_t BuildPixelRenderKey(std::int32_t universe, std::int32_t channel);
+
+// Position of a name among the virtual channels, from 1; 0 = absent. Any case; UTF-8.
+std::int32_t ZephReturnVirtualChannelKey(std::string_view name, const ZephRenderTables& tables);
+
+// Index of a key in RenderData, 0 = absent.
+inline std::int32_t FindCommandData(std::int32_t key, const ZephRenderTables& tables) {
+    return tables.Search.find(key);
+}
+
+// The bulbs of a channel, or nullptr where the fixture has none for it.
+const ZephBulbLocations* bulbLocations(const ZephFixtureState& state, std::int32_t channel);

@@ -76,13 +76,13 @@ void FrameWriter::lightCommand(const ZephLightCommand& address, const ZephLightT
 
 void FrameWriter::dmxDump(std::int32_t universe, std::span<const std::uint8_t> levels) {
     require(within(universe, kFirstUniverse, kLastUniverse), "the universe is not 1 to 999");
-    dump(universe, kDeviceDmx, 0, levels);
+    dump(universe, kDumpDmx, 0, levels);
 }
 
 void FrameWriter::controllerDump(std::int32_t network, std::int32_t unit, std::span<const std::uint8_t> levels) {
     require(within(network, kFirstNetwork, kLastNetwork), "the network is not 0 to 15");
     require(within(unit, kFirstUnit, kLastUnit), "the unit is not 1 to 240");
-    dump(network, kDeviceController, unit, levels);
+    dump(network, kDumpController, unit, levels);
 }
 
 void FrameWriter::dump(std::int32_t network, std::int32_t deviceType, std::int32_t unit,

@@ -86,7 +86,7 @@ void ZephProcessDmxStreams(CommandSink& sink, FailureReport& failures, LevelDump
     for (std::int32_t universe = kFirstUniverse; universe <= kLastUniverse; ++universe) {
         const std::span<const std::uint8_t> levels = dumps.ZephDmxDumpTable.levels(universe);
         if (levels.empty()) continue;
-        addDump(levels, {.Network = universe, .DeviceType = kDeviceDmx}, batch);
+        addDump(levels, {.Network = universe, .DeviceType = kDumpDmx}, batch);
         dumps.ZephDmxDumpTable.empty(universe);
     }
     batch.flush();
@@ -102,7 +102,7 @@ void ZephProcessKeshStreams(CommandSink& sink, FailureReport& failures, LevelDum
             const std::int32_t slot = controllerSlot(network, unit);
             const std::span<const std::uint8_t> levels = dumps.ZephControllerDumpTable.levels(slot);
             if (levels.empty()) continue;
-            addDump(levels, {.Network = network, .DeviceType = kDeviceController, .Unit = unit}, batch);
+            addDump(levels, {.Network = network, .DeviceType = kDumpController, .Unit = unit}, batch);
             dumps.ZephDmxDumpTable.empty(network);
         }
     }

@@ -121,10 +121,10 @@ private:
     // A dump for an address that no display can have is passed over; so is one for another device type.
     bool storeDump(const Address& address, std::string_view levels) {
         LevelDumps& dumps = stream_.Dumps;
-        if (address.deviceType == kDeviceDmx && address.network >= kFirstUniverse && address.network <= kLastUniverse) {
+        if (address.deviceType == kDumpDmx && address.network >= kFirstUniverse && address.network <= kLastUniverse) {
             if (!dumps.ZephDmxDumpTable.store(address.network, levels)) return false;
             dumps.ZephDmxDumpPending = true;
-        } else if (address.deviceType == kDeviceController && address.network >= kFirstNetwork &&
+        } else if (address.deviceType == kDumpController && address.network >= kFirstNetwork &&
                    address.network <= kLastNetwork && address.unit >= kFirstUnit && address.unit <= kLastUnit) {
             if (!dumps.ZephControllerDumpTable.store(controllerSlot(address.network, address.unit), levels)) {
                 return false;

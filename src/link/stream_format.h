@@ -18,8 +18,8 @@ inline constexpr std::int32_t kCmdDump = 1;
 inline constexpr std::int32_t kCmdNoOperation = 99;
 
 // Device types that a level dump can address.
-inline constexpr std::int32_t kDeviceController = 1;
-inline constexpr std::int32_t kDeviceDmx = 7;
+inline constexpr std::int32_t kDumpController = 1;
+inline constexpr std::int32_t kDumpDmx = 7;
 
 // Addresses of level dumps.
 inline constexpr std::int32_t kFirstUniverse = 1;

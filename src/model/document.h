@@ -17,6 +17,17 @@ public:
     virtual void clipboardAndStatusCleared() = 0;
 };
 
+// For a document that nothing is kept beside.
+class NoWatcher : public DocumentWatcher {
+public:
+    void selectionCleared() override {}
+    void fixtureRemoved(int) override {}
+    void objectListChanged() override {}
+    void canvasChanged() override {}
+    void editSessionReset() override {}
+    void clipboardAndStatusCleared() override {}
+};
+
 // Empties the document. keepEditState: the selection, the clipboard and the state flags stay.
 void ZephGlobalReset(bool keepEditState, ZephSimulation& simulation, DocumentWatcher& watcher);
 

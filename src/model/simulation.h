@@ -190,9 +190,10 @@ struct ZephSimulation {
     std::int32_t PropCount = 0;
     ZephBackground Background;
     OneBased<ZephLevel, kLevels> Levels;
-    std::int32_t Dimmed = 0;  // per cent at which fixtures on levels closed to editing are drawn; 0 hides them
-    std::string FilePath;     // folder with its separator
-    std::string FileName;     // bare name
+    std::int32_t Dimmed = 0;          // per cent at which fixtures on levels closed to editing are drawn; 0 hides them
+    std::string FilePath;             // folder with its separator
+    std::string FileName;             // bare name
+    std::string zephSaveFileVersion;  // as the file read last states it, known or not
     bool SimulationDirty = false;
     bool SimulationOpen = false;
     bool ChecksumMismatch = false;
@@ -200,4 +201,6 @@ struct ZephSimulation {
     // Stands in for a channel without LED of its own. It outlives loads on purpose: an old file sets it, and every
     // later file that says nothing inherits it.
     bool FixtureLedDefault = false;
+
+    bool operator==(const ZephSimulation&) const = default;
 };

@@ -2,7 +2,7 @@
 #include "model/data_directories.h"
 #include "model/document.h"
 #include "model/tables.h"
-#include "tests/support/recording_host.h"
+#include "tests/support/loading.h"
 
 #include <gtest/gtest.h>
 
@@ -10,25 +10,9 @@
 
 namespace {
 
-class QuietWatcher : public DocumentWatcher {
-public:
-    void selectionCleared() override { ++selections; }
-    void fixtureRemoved(int fixture) override { removed.push_back(fixture); }
-    void objectListChanged() override { ++lists; }
-    void canvasChanged() override { ++canvases; }
-    void editSessionReset() override {}
-    void clipboardAndStatusCleared() override { ++clipboards; }
-
-    std::vector<int> removed;
-    int selections = 0;
-    int lists = 0;
-    int canvases = 0;
-    int clipboards = 0;
-};
-
 struct Display {
     std::unique_ptr<ZephSimulation> simulation = std::make_unique<ZephSimulation>();
-    QuietWatcher watcher;
+    CountingWatcher watcher;
 
     Display(int fixtures, int props) {
         simulation->FixtureCount = fixtures;

@@ -1,0 +1,64 @@
+// What a drawing surface works out once, at entry into simulation: every plain channel and RGB group in the order in
+// which frames paint them, and their bulbs twice over: by group, and by bands of canvas rows in the order of painting.
+#pragma once
+
+#include "engine/blend.h"
+#include "engine/bulb_images.h"
+#include "engine/fixture_state.h"
+#include "engine/render_table.h"
+
+#include <cstdint>
+#include <vector>
+
+// A band and the sprites that it needs fit the second-level cache together.
+inline constexpr std::int32_t kBandRows = 32;
+
+// A plain channel or an RGB group. Units are numbered from 1 in the order of painting.
+struct PlanUnit {
+    std::int32_t Fixture = 0;
+    std::int32_t Channel = 0;      // 0 = an RGB group
+    std::int32_t FirstSprite = 0;  // into Sprites: one, or one a colour of a Multi Color channel
+    std::int32_t SpriteCount = 0;  // 0 = the fixture's size or shape has no mask: nothing is drawn
+    std::int32_t FirstRun = 0;     // into Runs
+    std::int32_t RunCount = 0;
+    std::int32_t FirstBulb = 0;  // into BulbPool, as in ZephBulbLocations
+    std::int32_t BulbCount = 0;
+    std::int32_t VisibleBulbs = 0;  // that touch the canvas
+    std::int32_t Side = 0;          // pixels, of a bulb's image
+};
+
+// Bulbs of one unit and one sprite, painted one after the other.
+struct PlanRun {
+    std::int32_t Unit = 0;
+    std::int32_t Sprite = 0;
+    std::int32_t FirstPlace = 0;
+    std::int32_t PlaceCount = 0;
+    bool WholeOnCanvas = false;  // no bulb of the run is cut by the canvas edge
+};
+
+struct FramePlan {
+    std::int32_t Width = 0;  // pixels, the canvas
+    std::int32_t Height = 0;
+    std::int32_t BandCount = 0;
+    std::vector<PlanUnit> Units;              // [0] not used
+    std::vector<std::int32_t> UnitOfChannel;  // [fixture x (kMaxChannels + 1) + channel], 0 = none
+    std::vector<std::int32_t> UnitOfGroup;    // [RGBIndex], 0 = none
+    std::vector<BulbSprite> Sprites;          // those of groups change from frame to frame
+    std::vector<BulbPlace> Places;            // of Runs, in order
+    std::vector<PlanRun> Runs;                // by unit
+    std::vector<BulbPlace> BandPlaces;        // of BandRuns, in order
+    std::vector<PlanRun> BandRuns;            // by band, within it in the order of painting
+    std::vector<std::int32_t> FirstBandRun;   // [band], one more than bands
+    std::int32_t ListedBulbs = 0;             // bulbs of units that are drawn by lists: ribbons, pixels, strobes
+    std::int32_t MaxSide = 0;                 // pixels
+    std::int32_t Groups = 0;                  // RGB groups
+    std::int32_t FloodGroups = 0;
+    std::int32_t MaxFloodSize = 0;  // of the flood groups
+};
+
+// A place whose image touches the canvas.
+bool touchesCanvas(std::int64_t x, std::int64_t y, std::int32_t side, std::int32_t width, std::int32_t height) noexcept;
+
+// width, height: the canvas in pixels, 1..kMaxCanvasPixels.
+FramePlan makeFramePlan(const ZephSimulation& document, const ZephRenderTables& tables, const ZephFixtureStates& states,
+                        const ZephMasks& masks, const ZephStaticBulbs& bulbs, std::int32_t width, std::int32_t height);

@@ -1,0 +1,122 @@
+#include "engine/key_search.h"
+
+#include <algorithm>
+#include <limits>
+
+#if defined(__x86_64__)
+#include <immintrin.h>
+#endif
+
+namespace {
+
+// Fills the end of the last block of a level. A real key may have the same value: it then stands before the padding
+// and is found first.
+constexpr std::int32_t kPadding = std::numeric_limits<std::int32_t>::max();
+
+#if defined(__x86_64__)
+// How many keys of a block are not above the key. target: the caller made sure that the processor has AVX2.
+__attribute__((target("avx2,popcnt"))) inline std::int32_t notAbove(const std::int32_t* block, __m256i key) {
+    const __m256i low = _mm256_load_si256(reinterpret_cast<const __m256i*>(block));
+    const __m256i high = _mm256_load_si256(reinterpret_cast<const __m256i*>(block + 8));
+    const __m256i above = _mm256_packs_epi32(_mm256_cmpgt_epi32(low, key), _mm256_cmpgt_epi32(high, key));
+    return 16 - _mm_popcnt_u32(static_cast<unsigned>(_mm256_movemask_epi8(above))) / 2;
+}
+#endif
+
+}  // namespace
+
+void KeySearch::clear() {
+    count_ = 0;
+    blocks_.clear();
+    levelStart_.clear();
+}
+
+void KeySearch::build(std::span<const std::int32_t> sorted) {
+    clear();
+    count_ = static_cast<std::int32_t>(sorted.size());
+    if (count_ == 0) return;
+    std::vector<std::int32_t> level(sorted.begin(), sorted.end());
+    for (;;) {
+        const std::size_t levelBlocks = (level.size() + kBlock - 1) / kBlock;
+        levelStart_.push_back(static_cast<std::int32_t>(blocks_.size()));
+        level.resize(levelBlocks * kBlock, kPadding);
+        std::vector<std::int32_t> heads;
+        for (std::size_t b = 0; b < levelBlocks; ++b) {
+            Block block;
+            std::copy_n(level.begin() + static_cast<std::ptrdiff_t>(b) * kBlock, kBlock, block.keys.begin());
+            blocks_.push_back(block);
+            heads.push_back(block.keys[0]);
+        }
+        if (levelBlocks == 1) break;
+        level = std::move(heads);
+    }
+}
+
+std::int32_t KeySearch::findPortable(std::int32_t key) const noexcept {
+    if (count_ == 0) return 0;
+    std::int32_t index = 0;
+    for (std::size_t level = levelStart_.size(); level-- > 0;) {
+        const Block& block = blocks_[static_cast<std::size_t>(levelStart_[level] + index)];
+        std::int32_t atMost = 0;
+        for (const std::int32_t head : block.keys)
+            atMost += head <= key ? 1 : 0;
+        index = index * kBlock + std::max(atMost - 1, 0);
+    }
+    // The highest key possible is counted among the padding behind it, so the place may lie past the end.
+    index = std::min(index, count_ - 1);
+    const Block& block = blocks_[static_cast<std::size_t>(index / kBlock)];
+    return block.keys[static_cast<std::size_t>(index % kBlock)] == key ? index + 1 : 0;
+}
+
+#if defined(__x86_64__)
+
+__attribute__((target("avx2,popcnt"))) void KeySearch::findManyVector(std::span<const std::int32_t> keys,
+                                                                      std::int32_t* positions) const noexcept {
+    constexpr std::size_t kLanes = 8;
+    const Block* const blocks = blocks_.data();
+    std::size_t done = 0;
+    while (done < keys.size()) {
+        const std::size_t lanes = std::min(kLanes, keys.size() - done);
+        std::int32_t index[kLanes] = {};
+        for (std::size_t level = levelStart_.size(); level-- > 0;) {
+            const Block* const first = blocks + levelStart_[level];
+            for (std::size_t lane = 0; lane < lanes; ++lane) {
+                const std::int32_t atMost =
+                    notAbove(first[index[lane]].keys.data(), _mm256_set1_epi32(keys[done + lane]));
+                index[lane] = index[lane] * kBlock + (atMost > 0 ? atMost - 1 : 0);
+            }
+        }
+        for (std::size_t lane = 0; lane < lanes; ++lane) {
+            const std::int32_t place = std::min(index[lane], count_ - 1);
+            const std::int32_t found = blocks[place / kBlock].keys[static_cast<std::size_t>(place % kBlock)];
+            positions[done + lane] = found == keys[done + lane] ? place + 1 : 0;
+        }
+        done += lanes;
+    }
+}
+
+void KeySearch::findMany(std::span<const std::int32_t> keys, std::int32_t* positions) const noexcept {
+    if (count_ == 0) {
+        std::fill_n(positions, keys.size(), 0);
+    } else if (__builtin_cpu_supports("avx2")) {
+        findManyVector(keys, positions);
+    } else {
+        for (std::size_t i = 0; i < keys.size(); ++i)
+            positions[i] = findPortable(keys[i]);
+    }
+}
+
+#else
+
+void KeySearch::findMany(std::span<const std::int32_t> keys, std::int32_t* positions) const noexcept {
+    for (std::size_t i = 0; i < keys.size(); ++i)
+        positions[i] = findPortable(keys[i]);
+}
+
+#endif
+
+std::int32_t KeySearch::find(std::int32_t key) const noexcept {
+    std::int32_t position = 0;
+    findMany({&key, 1}, &position);
+    return position;
+}

@@ -1,0 +1,59 @@
+// The coloured images of RGB groups in simulation: a cache of 128 colours in front of the masks. An image lives as long
+// as a group or the cache holds it. All storage is reserved before the first frame; nothing here allocates after.
+#pragma once
+
+#include "engine/bulb_images.h"
+#include "engine/render_table.h"
+
+#include <array>
+#include <cstdint>
+#include <vector>
+
+inline constexpr int kRGBBulbCacheSize = 128;
+inline constexpr std::int32_t kFloodShapeKey = 12;  // stands for the shape of a flood, after the bulb types
+inline constexpr std::int32_t kRGBRebuildDrift = 30;
+
+// Entries 1..128, column by column so that the search runs through whole vectors. A column 0 is not used.
+struct ZephRGBBulbCache {
+    std::array<std::int32_t, kRGBBulbCacheSize + 1> Color{};
+    std::array<std::int32_t, kRGBBulbCacheSize + 1> SizeAndShape{};  // 16 x BulbSize + BulbShape, 12 = a flood
+    std::array<std::int32_t, kRGBBulbCacheSize + 1> Hits{};          // 0 = empty
+    std::array<std::int32_t, kRGBBulbCacheSize + 1> Bulb{};          // handle
+    std::int64_t RGBBulbCacheHits = 0;
+    std::int64_t RGBBulbCacheMisses = 0;
+};
+
+// The images behind the handles 1.. that stand in ZephRGBData::Bulb and in the cache.
+class RGBBulbPool {
+public:
+    // Room for every image that can be alive at once: one a group, and the cache full. groups: all RGB groups;
+    // floodGroups of them are floods, none larger than maxFloodSize.
+    void reserve(std::int32_t groups, std::int32_t floodGroups, std::int32_t maxFloodSize);
+
+    // handle from create.
+    const BulbImage& image(std::int32_t handle) const noexcept { return images_[static_cast<std::size_t>(handle)]; }
+
+    // A new image, held once. 0 if the reserved room is used up.
+    std::int32_t create(const BulbMask* mask, std::int32_t color);
+    void hold(std::int32_t handle) noexcept;     // 0 is ignored
+    void release(std::int32_t handle) noexcept;  // 0 is ignored; the last holder frees the image
+
+private:
+    std::vector<BulbImage> images_;  // [0] not used
+    std::vector<std::int32_t> holders_;
+    std::vector<std::int32_t> freeHard_;
+    std::vector<std::int32_t> freeSoft_;
+    std::int32_t firstSoft_ = 0;
+};
+
+// The largest of the three levels, 0..255.
+std::int32_t GetRGBIntensity(const ZephRGBData& group) noexcept;
+
+// Whether the levels have moved so far (30 in all) since the image was made that it must be made anew; then the present
+// levels are noted as those of the image. So call it once for each draw, before asking for a missing image.
+bool RGBBulbRebuildNeeded(ZephRGBData& group) noexcept;
+
+// Gives the group the image of a colour on the fixture's mask, from the cache where it is there. On a miss the entry
+// with the fewest hits goes, the first of equals. Hits are never aged: a colour that was popular once stays.
+void ZephUpdateRGBChannelBulb(const ZephFixture& fixture, std::int32_t color, const ZephMasks& masks,
+                              ZephRGBBulbCache& cache, RGBBulbPool& pool, ZephRGBData& group);

@@ -1,0 +1,47 @@
+// A temporary data folder with everything that loading and saving take, and a record of what they did.
+#pragma once
+
+#include "model/editor_loader.h"
+#include "tests/support/recording_host.h"
+
+#include <QTemporaryDir>
+
+#include <memory>
+
+// Counts what the document's primitives tell.
+class CountingWatcher : public DocumentWatcher {
+public:
+    void selectionCleared() override { ++selections; }
+    void fixtureRemoved(int fixture) override { removed.push_back(fixture); }
+    void objectListChanged() override { ++lists; }
+    void canvasChanged() override { ++canvases; }
+    void editSessionReset() override { ++sessions; }
+    void clipboardAndStatusCleared() override { ++clipboards; }
+
+    std::vector<int> removed;
+    int selections = 0;
+    int lists = 0;
+    int canvases = 0;
+    int sessions = 0;
+    int clipboards = 0;
+};
+
+// One document with its surroundings, in a folder that goes when it goes.
+struct LoadBench {
+    QTemporaryDir folder;
+    std::string folderPath = folder.path().toStdString() + "/";
+    ZephSettings settings;
+    ZephPathService paths{folderPath};
+    RecordingHost host;
+    CollectingFailures failures;
+    CountingWatcher watcher;
+    EditorFileContext context{settings, paths, host, failures, watcher};
+    std::unique_ptr<ZephSimulation> simulation = std::make_unique<ZephSimulation>();
+
+    LoadBench() { name("display.zee"); }
+    void name(std::string fileName) {
+        simulation->FilePath = folderPath;
+        simulation->FileName = std::move(fileName);
+    }
+    std::string path() const { return simulation->FilePath + simulation->FileName; }
+};
