@@ -39,6 +39,8 @@ int main(int count, char** arguments) {
     BenchReport report;
     benchLoad(report);
     benchParser(report);
+    benchCommands(report);
+    benchCompile(report);
     if (!goalsOnly) printRows(report);
     printGoals(report);
     return 0;

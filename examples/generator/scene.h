@@ -93,16 +93,16 @@ constexpr double pathHalfWidth(double t) {
     return 24 + 58 * t;
 }
 
-inline constexpr ScenePoint kBigTree{150, 668};  // foot of the bare tree
+inline constexpr ScenePoint kBigTree{164, 668};  // foot of the bare tree
 inline constexpr ScenePoint kMegaTree{1138, 716};
 inline constexpr double kMegaTreeHeight = 372;
 inline constexpr double kMegaTreeHalf = 104;
 
 inline constexpr std::array<SceneFir, 4> kFirs{{
-    {{42, 642}, 208, 56},
+    {{62, 642}, 208, 56},
     {{246, 630}, 150, 42},
     {{1052, 634}, 142, 40},
-    {{1246, 650}, 228, 58},
+    {{1220, 650}, 228, 56},
 }};
 
 inline constexpr double kFencePitch = 22;

@@ -81,10 +81,6 @@ void RGBBulbPool::release(std::int32_t handle) noexcept {
     (handle >= firstSoft_ ? freeSoft_ : freeHard_).push_back(handle);
 }
 
-std::int32_t GetRGBIntensity(const ZephRGBData& group) noexcept {
-    return std::max({group.Level[1], group.Level[2], group.Level[3]});
-}
-
 bool RGBBulbRebuildNeeded(ZephRGBData& group) noexcept {
     std::int32_t drift = 0;
     for (std::size_t c = 1; c <= 3; ++c)

@@ -46,9 +46,6 @@ private:
     std::int32_t firstSoft_ = 0;
 };
 
-// The largest of the three levels, 0..255.
-std::int32_t GetRGBIntensity(const ZephRGBData& group) noexcept;
-
 // Whether the levels have moved so far (30 in all) since the image was made that it must be made anew; then the present
 // levels are noted as those of the image. So call it once for each draw, before asking for a missing image.
 bool RGBBulbRebuildNeeded(ZephRGBData& group) noexcept;

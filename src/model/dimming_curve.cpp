@@ -9,8 +9,7 @@ namespace {
 
 constexpr std::string_view kModule = "modZephLoadSave";
 
-std::size_t byteAttribute(const XmlNode& node, std::string_view name,
-                          std::source_location where = std::source_location::current()) {
+std::size_t byteAttribute(const XmlNode& node, std::string_view name, SourceLine where = SourceLine::current()) {
     const std::int32_t value = longAttribute(node, name, where);
     require(value >= 0 && value <= 255, "A value of the curve is not in 0..255", where);
     return static_cast<std::size_t>(value);

@@ -13,10 +13,6 @@ class xml_node;
 }
 
 using ZephDimmingCurve = std::array<std::uint8_t, 256>;  // output intensity 0..255, by input intensity 0..255
- // output intensity 0..255, by input intensity 0..255
-
-    bool operator==(const ZephDimmingCurve&) const = default;
-};
 
 // The identity: what goes in comes out. It stands in when the file cannot be read.
 ZephDimmingCurve ZephCreateDummyDimmingCurve();

@@ -7,7 +7,6 @@
 
 #include <optional>
 #include <pugixml.hpp>
-#include <source_location>
 #include <string>
 #include <string_view>
 
@@ -46,8 +45,7 @@ private:
 
 // A required attribute. Throws Failure, with the caller's line, when it is missing or its text is no such value.
 template <typename Node>
-std::int32_t longAttribute(const Node& node, std::string_view name,
-                           std::source_location where = std::source_location::current()) {
+std::int32_t longAttribute(const Node& node, std::string_view name, SourceLine where = SourceLine::current()) {
     const auto text = node.attribute(name);
     require(text.has_value(), "A required attribute is missing", where);
     const auto value = parseLong(*text);
@@ -56,8 +54,7 @@ std::int32_t longAttribute(const Node& node, std::string_view name,
 }
 
 template <typename Node>
-bool flagAttribute(const Node& node, std::string_view name,
-                   std::source_location where = std::source_location::current()) {
+bool flagAttribute(const Node& node, std::string_view name, SourceLine where = SourceLine::current()) {
     const auto text = node.attribute(name);
     require(text.has_value(), "A required attribute is missing", where);
     const auto value = parseFlag(*text);
@@ -66,8 +63,7 @@ bool flagAttribute(const Node& node, std::string_view name,
 }
 
 template <typename Node>
-std::string textAttribute(const Node& node, std::string_view name,
-                          std::source_location where = std::source_location::current()) {
+std::string textAttribute(const Node& node, std::string_view name, SourceLine where = SourceLine::current()) {
     auto text = node.text(name);
     require(text.has_value(), "A required attribute is missing", where);
     return *std::move(text);
@@ -75,7 +71,7 @@ std::string textAttribute(const Node& node, std::string_view name,
 
 // The number of a record, 1..max.
 template <typename Node>
-int slotAttribute(const Node& node, int max, std::source_location where = std::source_location::current()) {
+int slotAttribute(const Node& node, int max, SourceLine where = SourceLine::current()) {
     const std::int32_t slot = longAttribute(node, "ID", where);
     require(slot >= 1 && slot <= max, "Subscript out of range", where);
     return slot;
@@ -83,6 +79,6 @@ int slotAttribute(const Node& node, int max, std::source_location where = std::s
 
 template <typename Node>
 std::int32_t longAttributeOr(const Node& node, std::string_view name, std::int32_t otherwise,
-                             std::source_location where = std::source_location::current()) {
+                             SourceLine where = SourceLine::current()) {
     return node.attribute(name) ? longAttribute(node, name, where) : otherwise;
 }

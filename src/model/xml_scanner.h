@@ -86,7 +86,6 @@ private:
     const char* at_;
     std::size_t rootName_ = 0;
     int open_ = 0;     // how many elements are open; the innermost is frame open_
-    int entered_ = 0;  // depth of the element whose start tag was read last
     bool unusual_ = false;
     std::array<Frame, kMaxDepth + 1> frames_;
 };

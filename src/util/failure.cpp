@@ -1,6 +1,6 @@
 #include "util/failure.h"
 
-void throwFailure(const char* description, std::source_location where) {
+void throwFailure(const char* description, SourceLine where) {
     throw Failure(description, where);
 }
 

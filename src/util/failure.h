@@ -2,27 +2,32 @@
 // through ErrReport, and turned into that procedure's failure result.
 #pragma once
 
-#include <source_location>
 #include <stdexcept>
 #include <string>
 #include <string_view>
 
+// The line of whoever calls a procedure that takes this with current() as its default. The standard's own
+// source_location is not there yet in the compiler of the sanitizers.
+struct SourceLine {
+    int number = 0;
+    static constexpr SourceLine current(int line = __builtin_LINE()) noexcept { return {line}; }
+};
+
 // An exception that remembers the line on which it arose.
 class Failure : public std::runtime_error {
 public:
-    explicit Failure(const std::string& description, std::source_location where = std::source_location::current())
-        : std::runtime_error(description), line_(static_cast<int>(where.line())) {}
+    explicit Failure(const std::string& description, SourceLine where = SourceLine::current())
+        : std::runtime_error(description), line_(where.number) {}
     int line() const noexcept { return line_; }
 
 private:
     int line_;
 };
 
-[[noreturn]] void throwFailure(const char* description, std::source_location where);
+[[noreturn]] void throwFailure(const char* description, SourceLine where);
 
 // Throws Failure with the caller's line unless the condition holds.
-inline void require(bool condition, const char* description,
-                    std::source_location where = std::source_location::current()) {
+inline void require(bool condition, const char* description, SourceLine where = SourceLine::current()) {
     if (!condition) [[unlikely]]
         throwFailure(description, where);
 }

@@ -5,7 +5,6 @@
 
 #include <array>
 #include <cassert>
-#include <source_location>
 
 template <typename T, int N>
 class OneBased {
@@ -23,11 +22,11 @@ public:
     }
 
     // For numbers from files, packets and users: throws Failure, with the caller's line, outside 1..N.
-    T& at(int number, std::source_location where = std::source_location::current()) {
+    T& at(int number, SourceLine where = SourceLine::current()) {
         require(contains(number), "Subscript out of range", where);
         return (*this)[number];
     }
-    const T& at(int number, std::source_location where = std::source_location::current()) const {
+    const T& at(int number, SourceLine where = SourceLine::current()) const {
         require(contains(number), "Subscript out of range", where);
         return (*this)[number];
     }

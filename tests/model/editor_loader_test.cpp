@@ -94,6 +94,7 @@ TEST(Loading, ReplacesEverythingThatWasOpen) {
     ZephGlobalReset(false, *blank, nobody);
     blank->FilePath = bench.simulation->FilePath;
     blank->FileName = bench.simulation->FileName;
+    blank->zephSaveFileVersion = "3.0.0";
     EXPECT_TRUE(*bench.simulation == *blank);
     EXPECT_EQ(widthPixels(bench.simulation->Background), 1) << "no background, so one pixel";
     EXPECT_EQ(bench.watcher.selections, 1);
@@ -197,6 +198,7 @@ TEST(Loading, AStoredDocumentIsReadIntoTheRecordsAsTheyStand) {
     pugi::xml_document stored;
     ASSERT_TRUE(stored.load_string(editorText(*bench.simulation, bench.paths, "now").c_str()));
     const auto before = std::make_unique<ZephSimulation>(*bench.simulation);
+    before->zephSaveFileVersion = "3.0.0";
     ZephGlobalReset(true, *bench.simulation, bench.watcher);
     bench.simulation->FileUpgraded = true;
     EXPECT_TRUE(ZephLoadVisualizerXML(stored, true, bench.context, *bench.simulation));

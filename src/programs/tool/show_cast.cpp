@@ -112,7 +112,7 @@ private:
             ShowRibbon added;
             added.fixture = slot.Fixture;
             const std::int32_t resolution = std::clamp(display_.Fixtures[slot.Fixture].Kesh.Resolution, 0, 7);
-            added.restingResolution = kKeshResolutions[static_cast<std::size_t>(resolution)].Group;
+            added.ownResolution = kKeshResolutions[static_cast<std::size_t>(resolution)].Group;
             cast_.ribbons.push_back(added);
         }
         cast_.ribbons[static_cast<std::size_t>(ribbon)]

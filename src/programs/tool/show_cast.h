@@ -39,7 +39,7 @@ struct ShowRibbon {
     std::int32_t fixture = 0;
     std::array<std::int32_t, 7> magic{kNoChannel, kNoChannel, kNoChannel, kNoChannel,
                                       kNoChannel, kNoChannel, kNoChannel};  // 151..157
-    std::int32_t restingResolution = 0;  // value of channel 151 at which the ribbon shows its own resolution
+    std::int32_t ownResolution = 0;  // value of channel 151 that stands for the Resolution of the document
 };
 
 struct ShowCast {

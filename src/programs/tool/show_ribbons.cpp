@@ -1,4 +1,5 @@
 #include "programs/tool/show_scenes.h"
+#include "util/rounding.h"
 
 #include <algorithm>
 #include <array>
@@ -56,19 +57,47 @@ void showColorEffects(ShowStage& stage, ShowSpan span) {
         const std::int32_t start = span.at(static_cast<double>(step) / kSteps);
         for (const ShowRibbon& ribbon : stage.cast().ribbons) {
             timeline.set(start, ribbon.magic[kResolution],
-                         std::min<double>(kResolutionValues[static_cast<std::size_t>(step)], ribbon.restingResolution));
+                         std::min<double>(kResolutionValues[static_cast<std::size_t>(step)], ribbon.ownResolution));
             timeline.set(start, ribbon.magic[kSpeed], 60 + 10 * step);
             timeline.set(start, ribbon.magic[kIntensity], 100);
             timeline.set(start, ribbon.magic[kColorEffect], 1 + effect0++ % kColorEffects);
         }
     }
-    for (const ShowRibbon& ribbon : stage.cast().ribbons) {
-        timeline.set(span.toMs, ribbon.magic[kColorEffect], 0);
-        timeline.set(span.toMs, ribbon.magic[kResolution], ribbon.restingResolution);
+}
+
+// Ends the colour effects. A pixel that an effect has let go of takes orders again only from a command that is new in
+// a frame in which no lower level is alive; so the ribbons are put out in the dark, the lowest level first.
+void wakeRibbons(ShowStage& stage, ShowSpan span) {
+    ShowTimeline& timeline = stage.timeline();
+    restRibbons(stage, span.fromMs);
+    std::vector<std::int32_t> ribbonLights;
+    for (const std::int32_t number : stage.soloLights()) {
+        if (stage.light(number).fixtureType == kFixtureKesh) ribbonLights.push_back(number);
+    }
+    std::ranges::stable_sort(ribbonLights, {}, [&](std::int32_t number) { return stage.light(number).level; });
+    constexpr double kLightsATick = 15;  // what a frame carries
+    constexpr std::int32_t kPauseMs = 90;
+    double timeMs = span.fromMs + kPauseMs;
+    std::int32_t level = 0;
+    for (const std::int32_t number : ribbonLights) {
+        const ShowLight& light = stage.light(number);
+        if (level != 0 && light.level != level) timeMs += kPauseMs;
+        level = light.level;
+        for (const std::int32_t channel : light.channels)
+            timeline.set(truncateToInt(timeMs), channel, 0);
+        timeMs += ShowTimeline::kTickMs / kLightsATick;
     }
 }
 
 }  // namespace
+
+void restRibbons(ShowStage& stage, std::int32_t timeMs) {
+    for (const ShowRibbon& ribbon : stage.cast().ribbons) {
+        // A resolution of 0 is the ribbon's own; and a channel at 0 goes to sleep, which keeps its level quiet.
+        for (const std::int32_t channel : ribbon.magic)
+            stage.timeline().set(timeMs, channel, 0);
+    }
+}
 
 void ribbonScene(ShowStage& stage, ShowSpan span) {
     for (const std::int32_t number : stage.soloLights()) {
@@ -78,10 +107,18 @@ void ribbonScene(ShowStage& stage, ShowSpan span) {
         const ShowColor color = ribbon ? festiveColor(light.fixture) : festiveColor(light.prop).scaled(0.22);
         stage.paint(span.at(0.02 + 0.04 * light.x), number, 600, color);
     }
-    showMotions(stage, {span.at(0.1), span.at(0.66)});
-    showColorEffects(stage, {span.at(0.66), span.at(0.97)});
-    stage.animateUniverses(span, [&](const ShowLight& light, std::int32_t timeMs) {
+    showMotions(stage, {span.at(0.08), span.at(0.57)});
+    showColorEffects(stage, {span.at(0.57), span.at(0.82)});
+    const ShowSpan closing{span.at(0.8), span.at(0.84)};
+    for (const std::int32_t number : stage.soloLights()) {
+        if (stage.light(number).fixtureType != kFixtureKesh) stage.paint(closing.fromMs, number, closing.length(), {});
+    }
+    wakeRibbons(stage, {span.at(0.87), span.toMs});
+    stage.animateUniverses({span.fromMs, closing.toMs}, [&](const ShowLight& light, std::int32_t timeMs) {
         const double wave = light.propX + 0.5 * light.propY - (timeMs - span.fromMs) / 2600.0;
-        return colorOfHue(0.55 + 0.12 * wave, 0.8, 0.18 + 0.2 * easeIn(colorOfHue(wave, 1, 1).red));
+        const double glow = 0.18 + 0.2 * easeIn(colorOfHue(wave, 1, 1).red);
+        const double left = 1 - easeIn(static_cast<double>(timeMs - closing.fromMs) / std::max(1, closing.length()));
+        return colorOfHue(0.55 + 0.12 * wave, 0.8, glow * left);
     });
+    stage.dumpUniverses(closing.toMs, [](const ShowLight&, std::int32_t) { return ShowColor{}; });
 }

@@ -33,6 +33,9 @@ ShowColor spiral(const ShowLight& light, double seconds) {
 }
 
 ShowColor sparkle(const ShowLight& light, std::int32_t timeMs) {
+    if (light.fixtureType == kFixtureFlood) {  // a wall that sparkles is only restless
+        return colorOfHue(timeMs / 9000.0 + 0.3 * light.x, 0.8, strength(light));
+    }
     // Each light has a moment of its own in every period; the numbers only spread those moments.
     const auto self = static_cast<std::int32_t>(light.propX * 9973 + light.propY * 7919) + 31 * light.fixture;
     const std::int32_t beat = (timeMs + static_cast<std::int32_t>(900 * scatter(self, 1))) / 300;
@@ -160,12 +163,7 @@ void beatScene(ShowStage& stage, ShowSpan span) {
 }
 
 void fadeOutScene(ShowStage& stage, ShowSpan span) {
-    ShowTimeline& timeline = stage.timeline();
-    for (const ShowRibbon& ribbon : stage.cast().ribbons) {
-        for (std::size_t magic = 0; magic < ribbon.magic.size(); ++magic) {
-            timeline.set(span.fromMs, ribbon.magic[magic], magic == 0 ? ribbon.restingResolution : 0);
-        }
-    }
+    restRibbons(stage, span.fromMs);
     const auto start = [&](const ShowLight& light) { return 0.05 + 0.35 * (kLevels - light.level) / kLevels; };
     const std::int32_t sink = span.length() * 2 / 5;
     for (const std::int32_t number : stage.soloLights()) {

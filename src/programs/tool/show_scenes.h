@@ -9,7 +9,8 @@ void washScene(ShowStage& stage, ShowSpan span);
 void sweepScene(ShowStage& stage, ShowSpan span);
 // Spirals climb the pixel props; the circuits of a string chase each other, the rest breathes.
 void spiralScene(ShowStage& stage, ShowSpan span);
-// The ribbons show their motions, their resolutions and their colour effects on their seven own channels.
+// The ribbons show their motions, their resolutions and their colour effects on their seven own channels. Ends in the
+// dark.
 void ribbonScene(ShowStage& stage, ShowSpan span);
 // Every second light in turn, by level dumps of the controllers and by commands of 256 steps. Leaves solo lights dark.
 void beatScene(ShowStage& stage, ShowSpan span);
@@ -17,3 +18,6 @@ void beatScene(ShowStage& stage, ShowSpan span);
 void finaleScene(ShowStage& stage, ShowSpan span);
 // From the foreground to the background every channel fades out, and ribbons return to rest.
 void fadeOutScene(ShowStage& stage, ShowSpan span);
+
+// Ends all motions and effects of the ribbons, at their own resolution.
+void restRibbons(ShowStage& stage, std::int32_t timeMs);

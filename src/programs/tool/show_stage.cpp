@@ -86,11 +86,6 @@ void ShowStage::gatherTargets() {
             roles[static_cast<std::size_t>(channel)].part = part;
         }
     }
-    for (const ShowRibbon& ribbon : cast_.ribbons) {
-        if (ribbon.magic[0] != kNoChannel) {
-            roles[static_cast<std::size_t>(ribbon.magic[0])].resting = ribbon.restingResolution;
-        }
-    }
 
     std::map<std::int32_t, std::vector<std::int32_t>> universes;
     std::map<std::pair<std::int32_t, std::int32_t>, std::vector<std::int32_t>> controllers;
@@ -153,7 +148,7 @@ std::vector<std::uint8_t> ShowStage::levels(const DumpTarget& target, std::int32
     std::int32_t shaded = -1;  // the light whose colour is at hand: its three parts lie side by side
     ShowColor color;
     for (const DumpTarget::Circuit& circuit : target.circuits) {
-        double level = circuit.resting;
+        double level = 0;
         if (circuit.light >= 0) {
             const ShowLight& shown = light(circuit.light);
             if (circuit.light != shaded) color = shader(shown, timeMs);

@@ -37,10 +37,9 @@ struct ShowSpan {
 // A universe or controller whose channels are sent together, from channel 1 on.
 struct DumpTarget {
     struct Circuit {
-        std::int32_t light = -1;  // -1: no light; the channel then gets its resting level
+        std::int32_t light = -1;  // -1: no light; the channel is then held at 0
         std::int32_t part = 0;    // 0 red or plain, 1 green, 2 blue
         std::int32_t channel = kNoChannel;
-        double resting = 0;  // 0..100
     };
     std::int32_t network = 0;  // universe, or network of the controller
     std::int32_t unit = 0;     // 0 for a universe

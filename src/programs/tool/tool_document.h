@@ -13,17 +13,6 @@ public:
     void ErrReport(std::string_view description, std::string_view procedure, int line) override;
 };
 
-// Nothing is kept beside the document here.
-class NoWatcher : public DocumentWatcher {
-public:
-    void selectionCleared() override {}
-    void fixtureRemoved(int) override {}
-    void objectListChanged() override {}
-    void canvasChanged() override {}
-    void editSessionReset() override {}
-    void clipboardAndStatusCleared() override {}
-};
-
 struct ToolDocument {
     std::unique_ptr<ZephSimulation> simulation = std::make_unique<ZephSimulation>();
     ZephSettings settings;  // the defaults: the headless companion keeps none
