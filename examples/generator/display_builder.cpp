@@ -79,10 +79,6 @@ void addBulb(ZephFixture& fixture, ScenePoint place) {
     addPoint(fixture, kPointBulb, place);
 }
 
-void addPlaceHolder(ZephFixture& fixture) {
-    addPoint(fixture, kPointPlaceHolder, {});
-}
-
 void addStroke(ZephFixture& fixture, const std::vector<ScenePoint>& points) {
     std::int32_t type = kPointMove;
     for (const ScenePoint& point : points) {

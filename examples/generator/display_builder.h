@@ -82,7 +82,6 @@ ZephFixture& addFixture(ZephSimulation& display, int prop, std::int32_t type, co
                         std::int32_t level, FixtureLook look);
 
 void addBulb(ZephFixture& fixture, ScenePoint place);
-void addPlaceHolder(ZephFixture& fixture);
 // A line through all points, not joined to what was drawn before.
 void addStroke(ZephFixture& fixture, const std::vector<ScenePoint>& points);
 

@@ -97,7 +97,6 @@ void hangFence(ZephSimulation& display) {
             addBulb(fixture, {place.x, place.y + 5 + 18 * along * (1 - along) * 2.6});
         }
     }
-    addPlaceHolder(display.Fixtures[display.FixtureCount]);  // the strand's last pixel was cut off and taped
 }
 
 }  // namespace
@@ -112,7 +111,7 @@ void hangPixels(ZephSimulation& display) {
 void buildDisplay(ZephSimulation& display) {
     display.Background.BackgroundType = kBackgroundPicture;
     display.Background.PicFileName = "house.png";  // beside the editor file, wherever that lies
-    display.Background.PicIntensity = 78;          // darkened a little, so that the lights lead
+    display.Background.PicIntensity = 92;          // a little darker, so that the lights lead
     display.Background.EditorWidthTwips = scene::kWidth * 15;
     display.Background.EditorHeightTwips = scene::kHeight * 15;
     for (int level = 1; level <= kLevels; ++level) {

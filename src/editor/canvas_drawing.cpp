@@ -1,0 +1,16 @@
+#include "editor/canvas_drawing.h"
+
+#include <algorithm>
+
+void ZephRedrawObjects(const EditorCanvas& canvas, QImage& picBuffer) {
+    picBuffer = canvas.picBackground;
+    if (picBuffer.isNull()) return;
+    picBuffer.detach();
+    const EditorLights lights{canvas.simulation, canvas.settings, canvas.curve, canvas.bulbs};
+    const int fixtures = std::clamp(canvas.simulation.FixtureCount, 0, kMaxFixtures);
+    for (int level = 1; level <= kLevels; ++level) {
+        for (int fixture = 1; fixture <= fixtures; ++fixture) {
+            if (canvas.simulation.Fixtures[fixture].ZOrder == level) ZephDrawEditorLights(lights, fixture, picBuffer);
+        }
+    }
+}

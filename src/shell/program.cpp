@@ -1,0 +1,17 @@
+#include "shell/program.h"
+
+#include "model/data_directories.h"
+
+namespace {
+
+constexpr int kSystemFolder = 7;
+
+std::string logFile(const ZephPathService& paths) {
+    return ZephReturnDataDirectory(kSystemFolder, paths, ZephSettings{}) + "errorlog.txt";
+}
+
+}  // namespace
+
+Program::Program(ProgramSeams given, CommandLineParms commandLine)
+    : seams(std::move(given)), parms(std::move(commandLine)), paths(seams.dataFolder),
+      failures(logFile(paths), parms.ShowNextError, seams.host), random(seams.seed), sink(tables, seams.clock) {}

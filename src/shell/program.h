@@ -1,0 +1,72 @@
+// The state of the running program: one of each. Made by main, or by a test with seams of its own; everything else is
+// handed parts of it by reference.
+#pragma once
+
+#include "engine/bulb_images.h"
+#include "engine/light_commands.h"
+#include "engine/render_cycle.h"
+#include "engine/standard_surface.h"
+#include "link/communications.h"
+#include "model/dimming_curve.h"
+#include "model/document.h"
+#include "model/settings.h"
+#include "util/command_line.h"
+#include "util/error_log.h"
+#include "util/paths.h"
+#include "util/random_source.h"
+
+#include <QImage>
+
+#include <memory>
+#include <string>
+
+// States of the window; see ZephSwitchMode.
+inline constexpr int kStateSimulation = 1;
+inline constexpr int kStateSelectFixture = 3;
+
+// What differs between the program and a test of it.
+struct ProgramSeams {
+    Host& host;
+    const Clock& clock;
+    SimulationSocket& socket;
+    DocumentWatcher& watcher;
+    AdapterLister lister;
+    std::string dataFolder;     // base of the user's data folders
+    std::string programFolder;  // where the blank picture lies
+    std::uint64_t seed = 1;
+};
+
+struct Program {
+    Program(ProgramSeams seams, CommandLineParms parms);
+
+    ProgramSeams seams;
+    CommandLineParms parms;
+    ZephPathService paths;
+    ErrorLog failures;
+    ZephSettings settings;
+    bool StartupLoading = false;
+    int RenderEngine = kEngineStandard;
+    int ZephUIState = kStateSelectFixture;
+
+    std::unique_ptr<ZephSimulation> simulation = std::make_unique<ZephSimulation>();
+    ZephDimmingCurve curve{};
+    std::unique_ptr<ZephMasks> masks = std::make_unique<ZephMasks>();
+    std::unique_ptr<ZephStaticBulbs> bulbs = std::make_unique<ZephStaticBulbs>();
+
+    QImage picBackground;  // the picture at canvas size and brightness; null = no canvas yet
+    QImage picBuffer;      // the editor's composed canvas
+
+    std::unique_ptr<ZephFixtureStates> states = std::make_unique<ZephFixtureStates>();
+    ZephRenderTables tables;
+    ZephRenderClocks clocks;
+    SeededRandom random;
+    RenderTableSink sink;
+    StandardSurface surface;
+
+    Connection connection;
+    ZephAdapters adapters;
+    ParserSetup parser;
+    ReceiveState receive;
+
+    bool simulating() const { return ZephUIState == kStateSimulation; }
+};
