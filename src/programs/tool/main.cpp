@@ -1,6 +1,8 @@
 #include "programs/tool/demo_show_command.h"
 #include "programs/tool/info_command.h"
 #include "programs/tool/options.h"
+#include "programs/tool/record_command.h"
+#include "programs/tool/send_command.h"
 #include "programs/tool/table_command.h"
 #include "programs/tool/trace_command.h"
 
@@ -17,6 +19,8 @@ int runCommand(const ToolOptions& options) {
     if (options.command == "info") return runInfo(options);
     if (options.command == "table") return runTable(options);
     if (options.command == "demo-show") return runDemoShow(options);
+    if (options.command == "send") return runSend(options);
+    if (options.command == "record") return runRecord(options);
     return runTrace(options);
 }
 
