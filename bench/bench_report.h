@@ -65,3 +65,5 @@ void benchLoad(BenchReport& report);
 void benchParser(BenchReport& report);
 void benchCommands(BenchReport& report);
 void benchCompile(BenchReport& report);
+void benchMasks(BenchReport& report);
+void benchFrame(BenchReport& report);

@@ -41,6 +41,8 @@ int main(int count, char** arguments) {
     benchParser(report);
     benchCommands(report);
     benchCompile(report);
+    benchMasks(report);
+    benchFrame(report);
     if (!goalsOnly) printRows(report);
     printGoals(report);
     return 0;

@@ -55,9 +55,10 @@ void blendReference(const BulbSprite& sprite, std::uint8_t alpha, std::span<cons
     for (const BulbPlace& place : places) {
         const RowRange drawn = rowsOf(sprite, place.Y, rows);
         for (std::int32_t y = drawn.Top; y < drawn.Bottom; ++y) {
-            std::uint32_t* to = target.Origin + (place.Y + y) * target.Stride + place.X;
+            const std::ptrdiff_t start = (place.Y + y) * target.Stride + place.X;
             for (std::int32_t x = 0; x < 2 * sprite.Mask->Size; ++x) {
-                to[x] = blendPixelReference(sourcePixel(sprite, x, y), to[x], alpha);
+                target.Origin[start + x] =
+                    blendPixelReference(sourcePixel(sprite, x, y), target.Under[start + x], alpha);
             }
         }
     }
@@ -66,20 +67,21 @@ void blendReference(const BulbSprite& sprite, std::uint8_t alpha, std::span<cons
 void blendPortable(const BulbSprite& sprite, std::uint8_t alpha, std::span<const BulbPlace> places, RowRange rows,
                    const PixelTarget& target) noexcept {
     const BulbMask& mask = *sprite.Mask;
+    const std::int32_t side = 2 * mask.Size;
     for (const BulbPlace& place : places) {
         const RowRange drawn = rowsOf(sprite, place.Y, rows);
         for (std::int32_t y = drawn.Top; y < drawn.Bottom; ++y) {
-            std::uint32_t* to = target.Origin + (place.Y + y) * target.Stride + place.X;
-            const MaskBlocks blocks = mask.Blocks[static_cast<std::size_t>(y)];
-            const std::int32_t end = std::min(8 * blocks.End, 2 * mask.Size);
+            const std::ptrdiff_t start = (place.Y + y) * target.Stride + place.X;
+            const std::uint32_t* under = target.Under + start;
+            std::uint32_t* to = target.Origin + start;
             if (mask.Soft) {
                 const std::uint32_t* from = sprite.Pixels + y * mask.Stride;
-                for (std::int32_t x = 8 * blocks.First; x < end; ++x)
-                    to[x] = blendSoft(from[x], to[x], alpha);
+                for (std::int32_t x = 0; x < side; ++x)
+                    to[x] = blendSoft(from[x], under[x], alpha);
             } else {
                 const std::uint32_t* lanes = mask.Lanes.data() + y * mask.Stride;
-                for (std::int32_t x = 8 * blocks.First; x < end; ++x) {
-                    if (lanes[x] != 0) to[x] = blendHard(sprite.Color, to[x], alpha);
+                for (std::int32_t x = 0; x < side; ++x) {
+                    to[x] = lanes[x] != 0 ? blendHard(sprite.Color, under[x], alpha) : under[x];
                 }
             }
         }

@@ -30,7 +30,9 @@ struct BulbPlace {
 // outside the storage.
 struct PixelTarget {
     std::uint32_t* Origin = nullptr;
-    std::ptrdiff_t Stride = 0;  // pixels
+    std::ptrdiff_t Stride = 0;             // pixels
+    const std::uint32_t* Under = nullptr;  // what is blended over, addressed alike: Origin, or another picture, of
+                                           // which pixels that no bulb covers may or may not be copied
 };
 
 struct RowRange {

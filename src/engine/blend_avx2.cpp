@@ -48,21 +48,23 @@ ZEPH_AVX2_INLINE __m256i blendAll(__m256i destination, const HardBlend& blend) n
                                cutBy255(_mm256_add_epi16(_mm256_mullo_epi16(high, blend.keep), blend.add)));
 }
 
-ZEPH_AVX2_INLINE void blendBlock(std::uint32_t* to, __m256i lanes, const HardBlend& blend) noexcept {
-    const __m256i destination = load(to);
+ZEPH_AVX2_INLINE void blendBlock(const std::uint32_t* under, std::uint32_t* to, __m256i lanes,
+                                 const HardBlend& blend) noexcept {
+    const __m256i destination = load(under);
     store(to, _mm256_blendv_epi8(destination, blendAll(destination, blend), lanes));
 }
 
-// Two rows of four pixels.
-ZEPH_AVX2_INLINE void blendRowPair(std::uint32_t* to, std::ptrdiff_t stride, __m256i lanes,
+// Two rows of four pixels, the first of them at start.
+ZEPH_AVX2_INLINE void blendRowPair(const PixelTarget& target, std::ptrdiff_t start, __m256i lanes,
                                    const HardBlend& blend) noexcept {
-    auto* upper = reinterpret_cast<__m128i*>(to);
-    auto* lower = reinterpret_cast<__m128i*>(to + stride);
+    const auto* upper = reinterpret_cast<const __m128i*>(target.Under + start);
+    const auto* lower = reinterpret_cast<const __m128i*>(target.Under + start + target.Stride);
     const __m256i destination =
         _mm256_inserti128_si256(_mm256_castsi128_si256(_mm_loadu_si128(upper)), _mm_loadu_si128(lower), 1);
     const __m256i result = _mm256_blendv_epi8(destination, blendAll(destination, blend), lanes);
-    _mm_storeu_si128(upper, _mm256_castsi256_si128(result));
-    _mm_storeu_si128(lower, _mm256_extracti128_si256(result, 1));
+    _mm_storeu_si128(reinterpret_cast<__m128i*>(target.Origin + start), _mm256_castsi256_si128(result));
+    _mm_storeu_si128(reinterpret_cast<__m128i*>(target.Origin + start + target.Stride),
+                     _mm256_extracti128_si256(result, 1));
 }
 
 ZEPH_AVX2_INLINE bool wholeWithin(const BulbPlace& place, std::int32_t side, RowRange rows) noexcept {
@@ -74,18 +76,19 @@ ZEPH_AVX2 void blendHardRows(const BulbMask& mask, const HardBlend& blend, const
     const std::int32_t first = std::max(0, rows.Top - place.Y);
     const std::int32_t end = std::min(2 * mask.Size, rows.Bottom - place.Y);
     const std::uint32_t* lanes = mask.Lanes.data() + first * mask.Stride;
-    std::uint32_t* to = target.Origin + (place.Y + first) * target.Stride + place.X;
+    std::ptrdiff_t start = (place.Y + first) * target.Stride + place.X;
     for (std::int32_t y = first; y < end; ++y) {
         if (mask.Stride < kBlock) {
             alignas(32) std::uint32_t row[kBlock] = {};
             std::copy_n(lanes, mask.Stride, row);
-            blendBlock(to, load(row), blend);
+            blendBlock(target.Under + start, target.Origin + start, load(row), blend);
         } else {
-            for (std::int32_t x = 0; x < mask.Stride; x += kBlock)
-                blendBlock(to + x, load(lanes + x), blend);
+            for (std::int32_t x = 0; x < mask.Stride; x += kBlock) {
+                blendBlock(target.Under + start + x, target.Origin + start + x, load(lanes + x), blend);
+            }
         }
         lanes += mask.Stride;
-        to += target.Stride;
+        start += target.Stride;
     }
 }
 
@@ -98,7 +101,7 @@ ZEPH_AVX2 void blendHardBulbs(const BulbSprite& sprite, std::uint8_t alpha, std:
         const __m256i lanes = load(mask.Lanes.data());
         for (const BulbPlace& place : places) {
             if (wholeWithin(place, side, rows)) {
-                blendRowPair(target.Origin + place.Y * target.Stride + place.X, target.Stride, lanes, blend);
+                blendRowPair(target, place.Y * target.Stride + place.X, lanes, blend);
             } else {
                 blendHardRows(mask, blend, place, rows, target);
             }
@@ -113,9 +116,9 @@ ZEPH_AVX2 void blendHardBulbs(const BulbSprite& sprite, std::uint8_t alpha, std:
                 blendHardRows(mask, blend, place, rows, target);
                 continue;
             }
-            std::uint32_t* to = target.Origin + place.Y * target.Stride + place.X;
-            blendRowPair(to, target.Stride, upper, blend);
-            blendRowPair(to + 2 * target.Stride, target.Stride, lower, blend);
+            const std::ptrdiff_t start = place.Y * target.Stride + place.X;
+            blendRowPair(target, start, upper, blend);
+            blendRowPair(target, start + 2 * target.Stride, lower, blend);
         }
         return;
     }
@@ -147,11 +150,12 @@ ZEPH_AVX2_INLINE __m256i blendSoftHalf(__m256i destination, const SoftHalf& soft
     return cutBy255(_mm256_add_epi16(sum, carried));
 }
 
-ZEPH_AVX2_INLINE void blendSoftBlock(std::uint32_t* to, const SoftHalf& low, const SoftHalf& high) noexcept {
+ZEPH_AVX2_INLINE void blendSoftBlock(const PixelTarget& target, std::ptrdiff_t start, const SoftHalf& low,
+                                     const SoftHalf& high) noexcept {
     const __m256i zero = _mm256_setzero_si256();
-    const __m256i destination = load(to);
-    store(to, _mm256_packus_epi16(blendSoftHalf(_mm256_unpacklo_epi8(destination, zero), low),
-                                  blendSoftHalf(_mm256_unpackhi_epi8(destination, zero), high)));
+    const __m256i destination = load(target.Under + start);
+    store(target.Origin + start, _mm256_packus_epi16(blendSoftHalf(_mm256_unpacklo_epi8(destination, zero), low),
+                                                     blendSoftHalf(_mm256_unpackhi_epi8(destination, zero), high)));
 }
 
 // A flood's rows are the same from above and from below, so what a row of the image comes to serves two rows of pixels.
@@ -161,22 +165,22 @@ ZEPH_AVX2 void blendSoftBulbs(const BulbSprite& sprite, std::uint8_t alpha, std:
     const __m256i zero = _mm256_setzero_si256();
     const __m256i alphas = _mm256_set1_epi16(alpha);
     for (const BulbPlace& place : places) {
-        std::uint32_t* corner = target.Origin + place.Y * target.Stride + place.X;
+        const std::ptrdiff_t corner = place.Y * target.Stride + place.X;
         for (std::int32_t y = 0; y < mask.Size; ++y) {
             const std::int32_t mirror = 2 * mask.Size - 1 - y;
             const bool drawUpper = place.Y + y >= rows.Top && place.Y + y < rows.Bottom;
             const bool drawLower = place.Y + mirror >= rows.Top && place.Y + mirror < rows.Bottom;
             if (!drawUpper && !drawLower) continue;
             const std::uint32_t* from = sprite.Pixels + y * mask.Stride;
-            std::uint32_t* upper = corner + y * target.Stride;
-            std::uint32_t* lower = corner + mirror * target.Stride;
+            const std::ptrdiff_t upper = corner + y * target.Stride;
+            const std::ptrdiff_t lower = corner + mirror * target.Stride;
             const MaskBlocks blocks = mask.Blocks[static_cast<std::size_t>(y)];
             for (std::int32_t x = kBlock * blocks.First; x < kBlock * blocks.End; x += kBlock) {
                 const __m256i source = load(from + x);
                 const SoftHalf low = softHalf(_mm256_unpacklo_epi8(source, zero), alphas);
                 const SoftHalf high = softHalf(_mm256_unpackhi_epi8(source, zero), alphas);
-                if (drawUpper) blendSoftBlock(upper + x, low, high);
-                if (drawLower) blendSoftBlock(lower + x, low, high);
+                if (drawUpper) blendSoftBlock(target, upper + x, low, high);
+                if (drawLower) blendSoftBlock(target, lower + x, low, high);
             }
         }
     }

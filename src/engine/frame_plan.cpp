@@ -21,7 +21,7 @@ public:
         plan_.UnitOfGroup.assign(tables.RGBData.size(), 0);
     }
 
-    // Level by level, the plain channels before the groups; then what no entry names, so that every channel has a unit.
+    // Level by level, the plain channels before the groups.
     void addAll() {
         for (std::int32_t level = 1; level <= kLevels; ++level) {
             forEachSlot(level, [&](const ZephRenderSlot& slot) {
@@ -31,12 +31,10 @@ public:
                 if (slot.isRGB()) addGroup(slot.Fixture, slot.RGBIndex);
             });
         }
-        for (std::int32_t fixture = 1; fixture <= document_.FixtureCount; ++fixture) {
-            for (std::int32_t channel = 1; channel <= states_[fixture].LocationCount; ++channel) {
-                addChannel(fixture, channel);
-            }
-        }
     }
+
+    // Of bulbs that are only ever drawn by lists.
+    std::span<const BulbSquare> listedSquares() const noexcept { return listedSquares_; }
 
 private:
     template <typename Visit>
@@ -91,7 +89,10 @@ private:
         if (record.Fixture_Type == kFixtureKesh || record.Fixture_Type == kFixtureDmxPixels) {
             // Its bulbs come as lists; the groups of a fixture share its bulbs out among them.
             bool& counted = counted_[static_cast<std::size_t>(fixture)];
-            if (!counted) plan_.ListedBulbs += unit.BulbCount;
+            if (!counted) {
+                plan_.ListedBulbs += unit.BulbCount;
+                addListedPlaces(unit);
+            }
             counted = true;
         } else {
             addRuns(unit, plan_.Units.size() - 1);
@@ -116,15 +117,28 @@ private:
         return static_cast<std::int32_t>(plan_.Units.size() - 1);
     }
 
-    void addRuns(PlanUnit& unit, std::size_t number) {
-        const std::int32_t radius = unit.Side / 2;
+    // visit(place, bulb0, whole) for each bulb that touches the canvas; whole: it is not cut by the edge.
+    template <typename Visit>
+    void forEachPlace(const PlanUnit& unit, Visit visit) const {
         for (std::int32_t b = 0; b < unit.BulbCount; ++b) {
             const ZephBulbLocation& bulb = tables_.BulbPool[static_cast<std::size_t>(unit.FirstBulb + b)];
-            const std::int64_t x = std::int64_t{bulb.X} - radius;
-            const std::int64_t y = std::int64_t{bulb.Y} - radius;
+            const std::int64_t x = std::int64_t{bulb.X} - unit.Side / 2;
+            const std::int64_t y = std::int64_t{bulb.Y} - unit.Side / 2;
             if (bulb.Type == kPointPlaceHolder || !touchesCanvas(x, y, unit.Side, plan_.Width, plan_.Height)) continue;
             const bool whole = x >= 0 && y >= 0 && x + unit.Side <= plan_.Width && y + unit.Side <= plan_.Height;
-            const std::int32_t sprite = unit.FirstSprite + b % unit.SpriteCount;
+            visit(BulbPlace{static_cast<std::int16_t>(x), static_cast<std::int16_t>(y)}, b, whole);
+        }
+    }
+
+    void addListedPlaces(const PlanUnit& unit) {
+        forEachPlace(unit, [&](BulbPlace place, std::int32_t, bool) { listedSquares_.push_back({place, unit.Side}); });
+    }
+
+    void addRuns(PlanUnit& unit, std::size_t number) {
+        std::vector<std::uint64_t> tiles(kMaxTileRows, 0);
+        unit.Alone = true;
+        forEachPlace(unit, [&](BulbPlace place, std::int32_t bulb0, bool whole) {
+            const std::int32_t sprite = unit.FirstSprite + bulb0 % unit.SpriteCount;
             if (unit.RunCount == 0 || plan_.Runs.back().Sprite != sprite) {
                 plan_.Runs.push_back({static_cast<std::int32_t>(number), sprite,
                                       static_cast<std::int32_t>(plan_.Places.size()), 0, true});
@@ -133,9 +147,16 @@ private:
             PlanRun& run = plan_.Runs.back();
             ++run.PlaceCount;
             run.WholeOnCanvas = run.WholeOnCanvas && whole;
-            plan_.Places.push_back({static_cast<std::int16_t>(x), static_cast<std::int16_t>(y)});
+            unit.Alone = unit.Alone && whole;
+            plan_.Places.push_back(place);
             ++unit.VisibleBulbs;
+            markTiles({place, unit.Side}, plan_.Width, plan_.Height, tiles);
+        });
+        unit.FirstTile = static_cast<std::int32_t>(plan_.Tiles.size());
+        for (std::size_t row = 0; row < tiles.size(); ++row) {
+            if (tiles[row] != 0) plan_.Tiles.push_back({static_cast<std::int32_t>(row), tiles[row]});
         }
+        unit.TileCount = static_cast<std::int32_t>(plan_.Tiles.size()) - unit.FirstTile;
     }
 
     const ZephSimulation& document_;
@@ -145,7 +166,67 @@ private:
     const ZephStaticBulbs& bulbs_;
     FramePlan& plan_;
     std::array<bool, kMaxFixtures + 1> counted_{};  // [fixture], its bulbs are among ListedBulbs
+    std::vector<BulbSquare> listedSquares_;
 };
+
+// visit(unit number, square) for each bulb of all runs.
+template <typename Visit>
+void forEachRunSquare(const FramePlan& plan, Visit visit) {
+    for (const PlanRun& run : plan.Runs) {
+        const std::int32_t side = plan.Units[static_cast<std::size_t>(run.Unit)].Side;
+        for (std::int32_t p = 0; p < run.PlaceCount; ++p) {
+            visit(run.Unit, BulbSquare{plan.Places[static_cast<std::size_t>(run.FirstPlace + p)], side});
+        }
+    }
+}
+
+// Clears Alone wherever two bulbs touch, what the kernels write beside an image included.
+void findLoneUnits(std::span<const BulbSquare> listed, FramePlan& plan) {
+    constexpr std::int32_t kListedOwner = -1;
+    const auto footprint = [](std::int32_t side) { return side <= 4 ? 4 : (side + 7) / 8 * 8; };
+    std::int64_t pixels = 0;
+    forEachRunSquare(plan, [&](std::int32_t, const BulbSquare& square) {
+        pixels += std::int64_t{footprint(square.Side)} * square.Side;
+    });
+    if (pixels > 2 * std::int64_t{plan.Width} * plan.Height) {  // not worth the search: hardly any can stand alone
+        for (PlanUnit& unit : plan.Units)
+            unit.Alone = false;
+        return;
+    }
+    std::vector<std::int32_t> owners(static_cast<std::size_t>(plan.Width) * static_cast<std::size_t>(plan.Height), 0);
+    const auto own = [&](std::int32_t owner, const BulbSquare& square) {
+        const std::int32_t right = std::min(plan.Width, square.Place.X + footprint(square.Side));
+        const std::int32_t bottom = std::min(plan.Height, square.Place.Y + square.Side);
+        for (std::int32_t y = std::max(0, std::int32_t{square.Place.Y}); y < bottom; ++y) {
+            for (std::int32_t x = std::max(0, std::int32_t{square.Place.X}); x < right; ++x) {
+                std::int32_t& present = owners[static_cast<std::size_t>(y * plan.Width + x)];
+                if (present != 0) {
+                    if (present > 0) plan.Units[static_cast<std::size_t>(present)].Alone = false;
+                    if (owner > 0) plan.Units[static_cast<std::size_t>(owner)].Alone = false;
+                }
+                present = owner;
+            }
+        }
+    };
+    for (const BulbSquare& square : listed)
+        own(kListedOwner, square);
+    forEachRunSquare(plan, own);
+}
+
+void findBandColumns(std::span<const BulbSquare> listed, FramePlan& plan) {
+    plan.BandColumns.assign(static_cast<std::size_t>(plan.BandCount), {plan.Width, 0});
+    const auto reach = [&](std::int32_t, const BulbSquare& square) {
+        const BandRange bands = bandsOf(square, plan.Height);
+        for (std::int32_t band = bands.First; band <= bands.Last; ++band) {
+            ColumnRange& columns = plan.BandColumns[static_cast<std::size_t>(band)];
+            columns.Left = std::min(columns.Left, std::max(0, std::int32_t{square.Place.X}));
+            columns.Right = std::max(columns.Right, std::min(plan.Width, square.Place.X + square.Side));
+        }
+    };
+    for (const BulbSquare& square : listed)
+        reach(0, square);
+    forEachRunSquare(plan, reach);
+}
 
 // Shares the places of all runs out among the bands that they touch; the order within a band is that of the runs.
 void sortIntoBands(FramePlan& plan) {
@@ -159,9 +240,8 @@ void sortIntoBands(FramePlan& plan) {
         const std::int32_t side = plan.Units[static_cast<std::size_t>(run.Unit)].Side;
         for (std::int32_t p = 0; p < run.PlaceCount; ++p) {
             const BulbPlace place = plan.Places[static_cast<std::size_t>(run.FirstPlace + p)];
-            const std::int32_t first = std::max(0, std::int32_t{place.Y}) / kBandRows;
-            const std::int32_t last = std::min(plan.Height, place.Y + side) - 1;
-            for (std::int32_t band = first; band <= last / kBandRows; ++band) {
+            const BandRange touched = bandsOf({place, side}, plan.Height);
+            for (std::int32_t band = touched.First; band <= touched.Last; ++band) {
                 bands[static_cast<std::size_t>(band)].push_back({run.Unit, run.Sprite, place});
             }
         }
@@ -184,6 +264,22 @@ void sortIntoBands(FramePlan& plan) {
 
 }  // namespace
 
+BandRange bandsOf(const BulbSquare& square, std::int32_t height) noexcept {
+    return {std::max(0, std::int32_t{square.Place.Y}) / kBandRows,
+            (std::min(height, square.Place.Y + square.Side) - 1) / kBandRows};
+}
+
+void markTiles(const BulbSquare& square, std::int32_t width, std::int32_t height,
+               std::span<std::uint64_t> tiles) noexcept {
+    const std::int32_t left = std::max(0, std::int32_t{square.Place.X}) >> kTileShift;
+    const std::int32_t right = (std::min(width, square.Place.X + square.Side) - 1) >> kTileShift;
+    const std::int32_t top = std::max(0, std::int32_t{square.Place.Y}) >> kTileShift;
+    const std::int32_t bottom = (std::min(height, square.Place.Y + square.Side) - 1) >> kTileShift;
+    const std::uint64_t bits = (std::uint64_t{2} << right) - (std::uint64_t{1} << left);
+    for (std::int32_t row = top; row <= bottom; ++row)
+        tiles[static_cast<std::size_t>(row)] |= bits;
+}
+
 bool touchesCanvas(std::int64_t x, std::int64_t y, std::int32_t side, std::int32_t width,
                    std::int32_t height) noexcept {
     return x + side > 0 && y + side > 0 && x < width && y < height;
@@ -195,7 +291,10 @@ FramePlan makeFramePlan(const ZephSimulation& document, const ZephRenderTables& 
     plan.Width = width;
     plan.Height = height;
     plan.BandCount = (height + kBandRows - 1) / kBandRows;
-    PlanBuilder(document, tables, states, masks, bulbs, plan).addAll();
+    PlanBuilder builder(document, tables, states, masks, bulbs, plan);
+    builder.addAll();
+    findLoneUnits(builder.listedSquares(), plan);
+    findBandColumns(builder.listedSquares(), plan);
     sortIntoBands(plan);
     return plan;
 }

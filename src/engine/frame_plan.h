@@ -8,6 +8,7 @@
 #include "engine/render_table.h"
 
 #include <cstdint>
+#include <span>
 #include <vector>
 
 // A band and the sprites that it needs fit the second-level cache together.
@@ -25,6 +26,30 @@ struct PlanUnit {
     std::int32_t BulbCount = 0;
     std::int32_t VisibleBulbs = 0;  // that touch the canvas
     std::int32_t Side = 0;          // pixels, of a bulb's image
+    std::int32_t FirstTile = 0;     // into Tiles: where its runs lie
+    std::int32_t TileCount = 0;
+    bool Alone = false;  // whole on the canvas, and no bulb touches another's pixels, its own included
+};
+
+// Tiles of 64 x 64 pixels tell what of the frame has changed.
+inline constexpr std::int32_t kTileShift = 6;
+inline constexpr std::int32_t kMaxTileRows = (kMaxCanvasPixels >> kTileShift) + 1;
+static_assert(kMaxTileRows < 64);  // tiles of a row are bits of one number
+
+struct TileRow {
+    std::int32_t Row = 0;
+    std::uint64_t Bits = 0;  // bit of each tile of the row
+};
+
+struct ColumnRange {
+    std::int32_t Left = 0;   // pixels
+    std::int32_t Right = 0;  // one past the last
+};
+
+// A bulb's image at a place.
+struct BulbSquare {
+    BulbPlace Place;
+    std::int32_t Side = 0;  // pixels
 };
 
 // Bulbs of one unit and one sprite, painted one after the other.
@@ -49,12 +74,25 @@ struct FramePlan {
     std::vector<BulbPlace> BandPlaces;        // of BandRuns, in order
     std::vector<PlanRun> BandRuns;            // by band, within it in the order of painting
     std::vector<std::int32_t> FirstBandRun;   // [band], one more than bands
+    std::vector<TileRow> Tiles;               // by unit
+    std::vector<ColumnRange> BandColumns;     // [band], all that lights can reach
     std::int32_t ListedBulbs = 0;             // bulbs of units that are drawn by lists: ribbons, pixels, strobes
     std::int32_t MaxSide = 0;                 // pixels
     std::int32_t Groups = 0;                  // RGB groups
     std::int32_t FloodGroups = 0;
     std::int32_t MaxFloodSize = 0;  // of the flood groups
 };
+
+// Sets the tiles that the square touches, in rows of tiles from the top. The square touches the canvas.
+void markTiles(const BulbSquare& square, std::int32_t width, std::int32_t height,
+               std::span<std::uint64_t> tiles) noexcept;
+
+struct BandRange {
+    std::int32_t First = 0;
+    std::int32_t Last = 0;
+};
+// The bands that the square touches. It touches the canvas.
+BandRange bandsOf(const BulbSquare& square, std::int32_t height) noexcept;
 
 // A place whose image touches the canvas.
 bool touchesCanvas(std::int64_t x, std::int64_t y, std::int32_t side, std::int32_t width, std::int32_t height) noexcept;

@@ -1,45 +1,83 @@
 #include "engine/rgb_bulbs.h"
 
 #include <algorithm>
+#include <bit>
 #include <cstdlib>
 
 namespace {
 
-constexpr std::int32_t kHitsCeiling = 999'999'999;  // an entry with more is never thrown out
+constexpr std::int32_t kHitsCeiling = 999'999'999;  // an entry with as many is never thrown out
 
-std::int32_t sizeAndShape(const ZephFixture& fixture) noexcept {
-    const std::int32_t shape = fixture.Fixture_Type == kFixtureFlood ? kFloodShapeKey : fixture.BulbShape;
-    return 16 * fixture.BulbSize + shape;
-}
-
-// Entry of the colour, 0 = none.
-std::int32_t findEntry(const ZephRGBBulbCache& cache, std::int32_t color, std::int32_t key) noexcept {
-    for (std::size_t first = 1; first <= kRGBBulbCacheSize; first += 16) {
-        std::int32_t any = 0;
-        for (std::size_t i = first; i < first + 16; ++i) {
-            any |= static_cast<std::int32_t>(cache.Color[i] == color) &
-                   static_cast<std::int32_t>(cache.SizeAndShape[i] == key);
-        }
-        if (any == 0) continue;
-        for (std::size_t i = first; i < first + 16; ++i) {
-            if (cache.Color[i] == color && cache.SizeAndShape[i] == key && cache.Hits[i] > 0) {
-                return static_cast<std::int32_t>(i);
-            }
-        }
-    }
-    return 0;
-}
-
-// The first entry with the fewest hits; 0 if all stand at the ceiling.
-std::size_t leastUsed(const ZephRGBBulbCache& cache) noexcept {
-    std::int32_t fewest = kHitsCeiling;
-    for (std::size_t i = 1; i <= kRGBBulbCacheSize; ++i)
-        fewest = std::min(fewest, cache.Hits[i]);
-    if (fewest == kHitsCeiling) return 0;
-    return static_cast<std::size_t>(std::find(cache.Hits.begin() + 1, cache.Hits.end(), fewest) - cache.Hits.begin());
+std::size_t chainOf(std::int32_t color, std::int32_t size, std::int32_t shape) noexcept {
+    const std::uint32_t mixed = (static_cast<std::uint32_t>(color) ^ static_cast<std::uint32_t>(size) << 24 ^
+                                 static_cast<std::uint32_t>(shape) << 28) *
+                                2654435761U;  // 2^32 over the golden ratio: spreads neighbours
+    return mixed >> 24;
 }
 
 }  // namespace
+
+std::int32_t ZephRGBBulbCache::find(std::int32_t color, std::int32_t size, std::int32_t shape) const noexcept {
+    std::int32_t entry = chains_[chainOf(color, size, shape)];
+    while (entry != 0) {
+        const ZephRGBBulbCacheEntry& held = (*this)[entry];
+        if (held.Color == color && held.BulbSize == size && held.BulbShape == shape) break;
+        entry = held.Chained;
+    }
+    return entry;
+}
+
+std::int32_t ZephRGBBulbCache::leastUsed() noexcept {
+    if (lowest_[0] == 0 && lowest_[1] == 0) collectLowest();
+    if (lowest_[0] != 0) return 1 + std::countr_zero(lowest_[0]);
+    if (lowest_[1] != 0) return 65 + std::countr_zero(lowest_[1]);
+    return 0;
+}
+
+void ZephRGBBulbCache::collectLowest() noexcept {
+    lowestHits_ = kHitsCeiling;
+    for (std::size_t n = 1; n <= kRGBBulbCacheSize; ++n)
+        lowestHits_ = std::min(lowestHits_, entries_[n].Hits);
+    if (lowestHits_ == kHitsCeiling) return;
+    for (std::size_t n = 1; n <= kRGBBulbCacheSize; ++n) {
+        if (entries_[n].Hits == lowestHits_) lowest_[(n - 1) / 64] |= std::uint64_t{1} << (n - 1) % 64;
+    }
+}
+
+void ZephRGBBulbCache::countHit(std::int32_t entry) noexcept {
+    const auto n = static_cast<std::size_t>(entry);
+    if (entries_[n].Hits < kHitsCeiling) ++entries_[n].Hits;
+    lowest_[(n - 1) / 64] &= ~(std::uint64_t{1} << (n - 1) % 64);
+}
+
+std::int32_t ZephRGBBulbCache::replace(std::int32_t entry, std::int32_t color, std::int32_t size, std::int32_t shape,
+                                       std::int32_t bulb) noexcept {
+    const auto n = static_cast<std::size_t>(entry);
+    ZephRGBBulbCacheEntry& held = entries_[n];
+    if (held.Hits > 0) {
+        std::int32_t* link = &chains_[chainOf(held.Color, held.BulbSize, held.BulbShape)];
+        while (*link != entry)
+            link = &entries_[static_cast<std::size_t>(*link)].Chained;
+        *link = held.Chained;
+    }
+    const std::int32_t before = held.Bulb;
+    std::int32_t& chain = chains_[chainOf(color, size, shape)];
+    held = {size, shape, color, 1, bulb, chain};
+    chain = entry;
+
+    // With one hit it stands lowest, unless empty entries do.
+    const std::uint64_t bit = std::uint64_t{1} << (n - 1) % 64;
+    if (lowestHits_ > 1) {
+        lowest_ = {};
+        lowestHits_ = 1;
+    }
+    if (lowestHits_ == 1) {
+        lowest_[(n - 1) / 64] |= bit;
+    } else {
+        lowest_[(n - 1) / 64] &= ~bit;
+    }
+    return before;
+}
 
 void RGBBulbPool::reserve(std::int32_t groups, std::int32_t floodGroups, std::int32_t maxFloodSize) {
     const auto hard = static_cast<std::size_t>(groups - floodGroups + kRGBBulbCacheSize + 1);
@@ -94,25 +132,20 @@ void ZephUpdateRGBChannelBulb(const ZephFixture& fixture, std::int32_t color, co
                               ZephRGBBulbCache& cache, RGBBulbPool& pool, ZephRGBData& group) {
     const BulbMask* mask = maskOf(masks, fixture);
     if (mask == nullptr) return;  // sizes and shapes without a mask have no place in the cache either
-    const std::int32_t key = sizeAndShape(fixture);
-    if (const std::int32_t found = findEntry(cache, color, key); found != 0) {
-        const auto entry = static_cast<std::size_t>(found);
-        pool.hold(cache.Bulb[entry]);
+    const std::int32_t shape = fixture.Fixture_Type == kFixtureFlood ? kFloodShapeKey : fixture.BulbShape;
+    if (const std::int32_t entry = cache.find(color, fixture.BulbSize, shape); entry != 0) {
+        pool.hold(cache[entry].Bulb);
         pool.release(group.Bulb);
-        group.Bulb = cache.Bulb[entry];
-        if (cache.Hits[entry] < kHitsCeiling) ++cache.Hits[entry];
+        group.Bulb = cache[entry].Bulb;
+        cache.countHit(entry);
         ++cache.RGBBulbCacheHits;
         return;
     }
     pool.release(group.Bulb);
     group.Bulb = pool.create(mask, color);
     ++cache.RGBBulbCacheMisses;
-    const std::size_t entry = leastUsed(cache);
-    if (entry == 0) return;
-    pool.release(cache.Bulb[entry]);
-    pool.hold(group.Bulb);
-    cache.Color[entry] = color;
-    cache.SizeAndShape[entry] = key;
-    cache.Hits[entry] = 1;
-    cache.Bulb[entry] = group.Bulb;
+    if (const std::int32_t entry = cache.leastUsed(); entry != 0) {
+        pool.hold(group.Bulb);
+        pool.release(cache.replace(entry, color, fixture.BulbSize, shape, group.Bulb));
+    }
 }

@@ -13,14 +13,41 @@ inline constexpr int kRGBBulbCacheSize = 128;
 inline constexpr std::int32_t kFloodShapeKey = 12;  // stands for the shape of a flood, after the bulb types
 inline constexpr std::int32_t kRGBRebuildDrift = 30;
 
-// Entries 1..128, column by column so that the search runs through whole vectors. A column 0 is not used.
-struct ZephRGBBulbCache {
-    std::array<std::int32_t, kRGBBulbCacheSize + 1> Color{};
-    std::array<std::int32_t, kRGBBulbCacheSize + 1> SizeAndShape{};  // 16 x BulbSize + BulbShape, 12 = a flood
-    std::array<std::int32_t, kRGBBulbCacheSize + 1> Hits{};          // 0 = empty
-    std::array<std::int32_t, kRGBBulbCacheSize + 1> Bulb{};          // handle
-    std::int64_t RGBBulbCacheHits = 0;
+struct ZephRGBBulbCacheEntry {
+    std::int32_t BulbSize = 0;
+    std::int32_t BulbShape = 0;  // 12 = a flood
+    std::int32_t Color = 0;
+    std::int32_t Hits = 0;     // 0 = empty
+    std::int32_t Bulb = 0;     // handle
+    std::int32_t Chained = 0;  // next entry of the same chain, 0 = the last
+};
+
+// 128 colours, found through chains by colour, size and shape. What goes is the entry with the fewest hits, the first
+// of equals; a set of the entries that stand lowest spares the search for it.
+class ZephRGBBulbCache {
+public:
+    // 1..128, 0 = not there.
+    std::int32_t find(std::int32_t color, std::int32_t size, std::int32_t shape) const noexcept;
+    std::int32_t leastUsed() noexcept;  // 1..128, 0 = every entry stands at the highest count
+
+    void countHit(std::int32_t entry) noexcept;
+    // Puts an image in the entry's place, with one hit. Gives the handle that stood there.
+    std::int32_t replace(std::int32_t entry, std::int32_t color, std::int32_t size, std::int32_t shape,
+                         std::int32_t bulb) noexcept;
+    const ZephRGBBulbCacheEntry& operator[](std::int32_t entry) const noexcept {
+        return entries_[static_cast<std::size_t>(entry)];
+    }
+
+    std::int64_t RGBBulbCacheHits = 0;  // only counted
     std::int64_t RGBBulbCacheMisses = 0;
+
+private:
+    void collectLowest() noexcept;
+
+    std::array<ZephRGBBulbCacheEntry, kRGBBulbCacheSize + 1> entries_{};         // 1..
+    std::array<std::int32_t, 256> chains_{};                                     // first entry of each
+    std::array<std::uint64_t, 2> lowest_{~std::uint64_t{0}, ~std::uint64_t{0}};  // bit n - 1: entry n has lowestHits_
+    std::int32_t lowestHits_ = 0;
 };
 
 // The images behind the handles 1.. that stand in ZephRGBData::Bulb and in the cache.

@@ -40,7 +40,6 @@ bool StandardSurface::prepare(const SurfaceScene& scene, FailureReport& failures
     frame_.resize(width, height);
     background_.resize(width, height);
     band_.resize(kBandMargin + wholeCacheLines(width) + kBandMargin, kBandRows + 2 * kBandMarginRows);
-    loadPicture(scene.Background, background_);
     image_ = QImage(reinterpret_cast<uchar*>(frame_.row(0)), width, height,
                     frame_.stride() * static_cast<qsizetype>(sizeof(std::uint32_t)), QImage::Format_RGB32);
 
@@ -54,14 +53,12 @@ bool StandardSurface::prepare(const SurfaceScene& scene, FailureReport& failures
     bandListed_.resize(listed_.capacity() * static_cast<std::size_t>(plan_.MaxSide / kBandRows + 2));
     firstBandListed_.resize(bands + 1);
     lit_.reserve(plan_.Places.size() + listed);
-    tiles_.assign(static_cast<std::size_t>(height >> kTileShift) + 1, 0);
-    changed_.reserve(bands + tiles_.size() * (static_cast<std::size_t>(width >> kTileShift) + 1));
-    bandLight_.assign(bands, BandLight::Unknown);
+    litUnits_.reserve(plan_.Units.size());
+    tiles_.assign(kMaxTileRows, 0);
+    changed_.reserve(1 + bands + kMaxTileRows * kMaxTileRows);
+    bandLight_.assign(bands, BandLight::None);
     scene_.emplace(scene);
-
-    beginFrame();
-    endFrame();
-    return true;
+    return setBackground(scene.Background);
 } catch (...) {
     release();
     reportCaughtFailure(failures, "modZephRenderMainEngine", __func__, 0);
@@ -80,6 +77,7 @@ void StandardSurface::release() {
     noted_.clear();
     listed_.clear();
     lit_.clear();
+    litUnits_.clear();
     changed_.clear();
     lastRepeats_ = false;
 }
@@ -87,9 +85,13 @@ void StandardSurface::release() {
 bool StandardSurface::setBackground(const QImage& background) {
     if (!scene_ || background.size() != image_.size()) return false;
     loadPicture(background, background_);
+    loadPicture(background, frame_);
     lit_.clear();
-    std::fill(bandLight_.begin(), bandLight_.end(), BandLight::Unknown);
+    litUnits_.clear();
+    std::fill(bandLight_.begin(), bandLight_.end(), BandLight::None);
+    std::fill(lastAlpha_.begin(), lastAlpha_.end(), std::uint8_t{0});
     lastRepeats_ = false;
+    wholeChanged_ = true;
     return true;
 }
 

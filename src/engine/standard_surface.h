@@ -29,7 +29,6 @@ struct SurfaceScene {
 
 inline constexpr std::int32_t kBandMargin = 128;    // pixels beside a band: the largest image hangs out no farther
 inline constexpr std::int32_t kBandMarginRows = 4;  // small bulbs are painted whole, over the band's edge
-inline constexpr std::int32_t kTileShift = 6;       // tiles of 64 x 64 pixels tell what changed
 
 inline constexpr std::int32_t kCacheLinePixels = 16;
 
@@ -67,8 +66,8 @@ public:
     // Gives all storage back; until the next prepare nothing is drawn.
     void release();
 
-    // A new background picture of the same size, in the middle of a simulation: the next frame is painted anew.
-    // False if the size differs.
+    // A new background picture of the same size, in the middle of a simulation; until the next frame it shows
+    // alone. False if the size differs.
     [[nodiscard]] bool setBackground(const QImage& background);
 
     void beginFrame() override;
@@ -96,14 +95,10 @@ private:
         std::int32_t Unit;
         std::uint8_t Alpha;
     };
-    struct LitSquare {
-        BulbPlace Place;
-        std::int32_t Side;
-    };
     enum class BandLight : std::uint8_t {
         None,    // shows the background
         Runs,    // shows the runs of lastAlpha_: it stays while those do
-        Unknown  // is to be painted anew
+        Unknown  // shows other lights
     };
 
     void noteUnit(std::int32_t unit);
@@ -119,11 +114,13 @@ private:
     bool paintBand(std::size_t band);
 
     void paintSquares();
-    void paintSquare(std::int32_t sprite, std::uint8_t alpha, BulbPlace place, std::int32_t side);
-    void noteLit(BulbPlace place, std::int32_t side);
+    void paintSquare(std::int32_t sprite, std::uint8_t alpha, const BulbSquare& square);
+    void noteLit(const BulbSquare& square);
     void restoreLit();
+    void restoreSquare(const BulbSquare& square);
     void restoreBand(std::size_t band);
-    void markTiles(const LitSquare& square);
+    QRect bandRect(std::size_t band) const;
+    void markUnitTiles(const PlanUnit& unit);
     void collectTiles();
 
     const BlendKernels& kernels_;
@@ -154,6 +151,8 @@ private:
     // What the frame before left on the picture.
     std::vector<std::uint8_t> lastAlpha_;
     std::vector<BandLight> bandLight_;
-    std::vector<LitSquare> lit_;
-    bool lastRepeats_ = false;  // lastAlpha_ and the images tell all of it
+    std::vector<BulbSquare> lit_;
+    std::vector<std::int32_t> litUnits_;  // whose runs were painted square by square, in the first pass
+    bool wholeChanged_ = true;            // the frame under it was replaced
+    bool lastRepeats_ = false;            // lastAlpha_ and the images tell all of it
 };

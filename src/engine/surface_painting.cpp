@@ -18,6 +18,8 @@ void StandardSurface::endFrame() {
     if (!scene_) return;
     paintNoted();
     collectTiles();
+    if (wholeChanged_) changed_.assign(1, image_.rect());
+    wholeChanged_ = false;
     if (passes_ > 1) {
         std::fill(lastAlpha_.begin(), lastAlpha_.end(), std::uint8_t{0});
         std::replace(bandLight_.begin(), bandLight_.end(), BandLight::Runs, BandLight::Unknown);
@@ -59,12 +61,23 @@ bool StandardSurface::worthBands() const noexcept {
 }
 
 void StandardSurface::paintBands() {
-    for (const LitSquare& square : lit_) {
-        const std::int32_t first = std::max(0, std::int32_t{square.Place.Y}) / kBandRows;
-        const std::int32_t last = (std::min(plan_.Height, square.Place.Y + square.Side) - 1) / kBandRows;
-        for (std::int32_t b = first; b <= last; ++b)
+    for (const BulbSquare& square : lit_) {
+        const BandRange bands = bandsOf(square, plan_.Height);
+        for (std::int32_t b = bands.First; b <= bands.Last; ++b) {
             bandLight_[static_cast<std::size_t>(b)] = BandLight::Unknown;
+        }
     }
+    for (const std::int32_t number : litUnits_) {
+        const PlanUnit& unit = plan_.Units[static_cast<std::size_t>(number)];
+        for (std::int32_t t = 0; t < unit.TileCount; ++t) {
+            static_assert(1 << kTileShift == 2 * kBandRows);
+            const auto band =
+                2 * static_cast<std::size_t>(plan_.Tiles[static_cast<std::size_t>(unit.FirstTile + t)].Row);
+            bandLight_[band] = BandLight::Unknown;
+            if (band + 1 < bandLight_.size()) bandLight_[band + 1] = BandLight::Unknown;
+        }
+    }
+    litUnits_.clear();
     lit_.clear();
     sortListedIntoBands();
     for (std::size_t band = 0; band < bandLight_.size(); ++band) {
@@ -72,8 +85,7 @@ void StandardSurface::paintBands() {
         const bool lists = firstBandListed_[band] != firstBandListed_[band + 1];
         const bool lit = paintBand(band);
         bandLight_[band] = lists ? BandLight::Unknown : lit ? BandLight::Runs : BandLight::None;
-        const auto top = static_cast<std::int32_t>(band) * kBandRows;
-        changed_.emplace_back(0, top, plan_.Width, std::min(kBandRows, plan_.Height - top));
+        changed_.push_back(bandRect(band));
     }
     kernels_.endStreaming();
 }
@@ -119,12 +131,14 @@ bool StandardSurface::bandChanged(std::size_t band) const noexcept {
 bool StandardSurface::paintBand(std::size_t band) {
     const auto top = static_cast<std::int32_t>(band) * kBandRows;
     const std::int32_t rows = std::min(kBandRows, plan_.Height - top);
+    const std::int32_t left = plan_.BandColumns[band].Left / kCacheLinePixels * kCacheLinePixels;
+    const std::int32_t pixels = wholeCacheLines(plan_.BandColumns[band].Right - left);
     for (std::int32_t y = 0; y < rows; ++y) {
-        copyPixels(background_.row(top + y), band_.row(kBandMarginRows + y) + kBandMargin, plan_.Width);
+        copyPixels(background_.row(top + y) + left, band_.row(kBandMarginRows + y) + kBandMargin + left, pixels);
     }
 
-    const PixelTarget target{band_.row(kBandMarginRows) + kBandMargin - std::ptrdiff_t{top} * band_.stride(),
-                             band_.stride()};
+    std::uint32_t* origin = band_.row(kBandMarginRows) + kBandMargin - std::ptrdiff_t{top} * band_.stride();
+    const PixelTarget target{origin, band_.stride(), origin};
     const RowRange range{top - kBandMarginRows, top + rows + kBandMarginRows};
     bool lit = false;
     auto listed = static_cast<std::size_t>(firstBandListed_[band]);
@@ -151,22 +165,23 @@ bool StandardSurface::paintBand(std::size_t band) {
     }
     paintListedBefore(static_cast<std::int32_t>(plan_.Units.size()));
 
-    const std::int32_t pixels = wholeCacheLines(plan_.Width);
     for (std::int32_t y = 0; y < rows; ++y) {
-        kernels_.streamRow(band_.row(kBandMarginRows + y) + kBandMargin, frame_.row(top + y), pixels);
+        kernels_.streamRow(band_.row(kBandMarginRows + y) + kBandMargin + left, frame_.row(top + y) + left, pixels);
     }
     return lit;
 }
 
 void StandardSurface::paintSquares() {
-    const PixelTarget target{frame_.row(0), frame_.stride()};
+    const PixelTarget target{frame_.row(0), frame_.stride(), frame_.row(0)};
+    // A unit that stands alone goes straight over the background: what it showed before lies under it.
+    const PixelTarget aloneTarget{frame_.row(0), frame_.stride(), background_.row(0)};
     const RowRange rows{0, plan_.Height};
     for (const NotedUnit& noted : noted_) {
         const PlanUnit& unit = plan_.Units[static_cast<std::size_t>(noted.Unit)];
         for (std::int32_t i = 0; i < noted.ListedCount; ++i) {
             const ListedBulb& bulb = listed_[static_cast<std::size_t>(noted.FirstListed + i)];
-            paintSquare(bulb.Sprite, bulb.Alpha, bulb.Place, unit.Side);
-            noteLit(bulb.Place, unit.Side);
+            paintSquare(bulb.Sprite, bulb.Alpha, {bulb.Place, unit.Side});
+            noteLit({bulb.Place, unit.Side});
         }
         const std::uint8_t alpha = alpha_[static_cast<std::size_t>(noted.Unit)];
         if (alpha == 0) continue;
@@ -175,80 +190,108 @@ void StandardSurface::paintSquares() {
             const std::span<const BulbPlace> places{plan_.Places.data() + run.FirstPlace,
                                                     static_cast<std::size_t>(run.PlaceCount)};
             if (run.WholeOnCanvas) {
-                kernels_.blendBulbs(plan_.Sprites[static_cast<std::size_t>(run.Sprite)], alpha, places, rows, target);
+                kernels_.blendBulbs(plan_.Sprites[static_cast<std::size_t>(run.Sprite)], alpha, places, rows,
+                                    unit.Alone && passes_ == 0 ? aloneTarget : target);
             } else {
                 for (const BulbPlace& place : places)
-                    paintSquare(run.Sprite, alpha, place, unit.Side);
+                    paintSquare(run.Sprite, alpha, {place, unit.Side});
             }
-            for (const BulbPlace& place : places)
-                noteLit(place, unit.Side);
+            if (passes_ > 0) {
+                for (const BulbPlace& place : places)
+                    noteLit({place, unit.Side});
+            }
+        }
+        if (passes_ == 0) {
+            litUnits_.push_back(noted.Unit);
+            markUnitTiles(unit);
         }
     }
 }
 
-void StandardSurface::paintSquare(std::int32_t sprite, std::uint8_t alpha, BulbPlace place, std::int32_t side) {
+void StandardSurface::paintSquare(std::int32_t sprite, std::uint8_t alpha, const BulbSquare& square) {
     const BulbSprite& image = plan_.Sprites[static_cast<std::size_t>(sprite)];
-    const PixelTarget target{frame_.row(0), frame_.stride()};
-    if (place.X >= 0 && place.X + side <= plan_.Width) {
-        kernels_.blendBulbs(image, alpha, {&place, 1}, {0, plan_.Height}, target);
+    const PixelTarget target{frame_.row(0), frame_.stride(), frame_.row(0)};
+    if (square.Place.X >= 0 && square.Place.X + square.Side <= plan_.Width) {
+        kernels_.blendBulbs(image, alpha, {&square.Place, 1}, {0, plan_.Height}, target);
     } else {
-        blendClipped(image, alpha, place.X, place.Y, {target, plan_.Width, plan_.Height});
+        blendClipped(image, alpha, square.Place.X, square.Place.Y, {target, plan_.Width, plan_.Height});
     }
 }
 
 // Remembers a square for restoring. Where the list is full, which takes a frame that draws bulbs again and again, its
 // bands are restored whole.
-void StandardSurface::noteLit(BulbPlace place, std::int32_t side) {
-    const LitSquare square{place, side};
-    markTiles(square);
+void StandardSurface::noteLit(const BulbSquare& square) {
+    markTiles(square, plan_.Width, plan_.Height, tiles_);
     if (lit_.size() < lit_.capacity()) {
         lit_.push_back(square);
         return;
     }
-    const std::int32_t first = std::max(0, std::int32_t{place.Y}) / kBandRows;
-    const std::int32_t last = (std::min(plan_.Height, place.Y + side) - 1) / kBandRows;
-    for (std::int32_t b = first; b <= last; ++b)
+    const BandRange bands = bandsOf(square, plan_.Height);
+    for (std::int32_t b = bands.First; b <= bands.Last; ++b) {
         bandLight_[static_cast<std::size_t>(b)] = BandLight::Unknown;
+    }
 }
 
-// Brings the background back wherever the frame before left light.
+// Brings the background back wherever the frame before left light that will not be painted over.
 void StandardSurface::restoreLit() {
     for (std::size_t band = 0; band < bandLight_.size(); ++band) {
         if (bandLight_[band] != BandLight::None) restoreBand(band);
     }
-    for (const LitSquare& square : lit_) {
-        markTiles(square);
-        const std::int32_t left = std::max(0, std::int32_t{square.Place.X});
-        const std::int32_t right = std::min(plan_.Width, square.Place.X + square.Side);
-        const std::int32_t bottom = std::min(plan_.Height, square.Place.Y + square.Side);
-        for (std::int32_t y = std::max(0, std::int32_t{square.Place.Y}); y < bottom; ++y) {
-            const std::uint32_t* from = background_.row(y) + left;
-            std::uint32_t* to = frame_.row(y) + left;
-            // Four pixels at a time: what lies beyond the square is restored as well or dark anyway.
-            for (std::int32_t x = 0; x < right - left; x += 4)
-                copyPixels(from + x, to + x, 4);
-        }
+    for (const BulbSquare& square : lit_) {
+        markTiles(square, plan_.Width, plan_.Height, tiles_);
+        restoreSquare(square);
     }
     lit_.clear();
+    for (const std::int32_t number : litUnits_) {
+        const PlanUnit& unit = plan_.Units[static_cast<std::size_t>(number)];
+        if (unit.Alone && alpha_[static_cast<std::size_t>(number)] != 0) continue;
+        markUnitTiles(unit);
+        for (std::int32_t r = 0; r < unit.RunCount; ++r) {
+            const PlanRun& run = plan_.Runs[static_cast<std::size_t>(unit.FirstRun + r)];
+            for (std::int32_t p = 0; p < run.PlaceCount; ++p) {
+                restoreSquare({plan_.Places[static_cast<std::size_t>(run.FirstPlace + p)], unit.Side});
+            }
+        }
+    }
+    litUnits_.clear();
+}
+
+void StandardSurface::restoreSquare(const BulbSquare& square) {
+    const std::int32_t left = std::max(0, std::int32_t{square.Place.X});
+    const std::int32_t right = std::min(plan_.Width, square.Place.X + square.Side);
+    const std::int32_t bottom = std::min(plan_.Height, square.Place.Y + square.Side);
+    for (std::int32_t y = std::max(0, std::int32_t{square.Place.Y}); y < bottom; ++y) {
+        const std::uint32_t* from = background_.row(y) + left;
+        std::uint32_t* to = frame_.row(y) + left;
+        std::int32_t x = 0;
+        for (; x + 4 <= right - left; x += 4)
+            copyPixels(from + x, to + x, 4);
+        for (; x < right - left; ++x)
+            to[x] = from[x];
+    }
 }
 
 void StandardSurface::restoreBand(std::size_t band) {
-    const auto top = static_cast<std::int32_t>(band) * kBandRows;
-    const std::int32_t rows = std::min(kBandRows, plan_.Height - top);
-    for (std::int32_t y = top; y < top + rows; ++y)
-        copyPixels(background_.row(y), frame_.row(y), plan_.Width);
+    const QRect rect = bandRect(band);
+    for (std::int32_t y = rect.top(); y <= rect.bottom(); ++y) {
+        copyPixels(background_.row(y) + rect.left(), frame_.row(y) + rect.left(), rect.width());
+    }
     bandLight_[band] = BandLight::None;
-    changed_.emplace_back(0, top, plan_.Width, rows);
+    changed_.push_back(rect);
 }
 
-void StandardSurface::markTiles(const LitSquare& square) {
-    const std::int32_t left = std::max(0, std::int32_t{square.Place.X}) >> kTileShift;
-    const std::int32_t right = (std::min(plan_.Width, square.Place.X + square.Side) - 1) >> kTileShift;
-    const std::int32_t top = std::max(0, std::int32_t{square.Place.Y}) >> kTileShift;
-    const std::int32_t bottom = (std::min(plan_.Height, square.Place.Y + square.Side) - 1) >> kTileShift;
-    const std::uint64_t bits = (std::uint64_t{2} << right) - (std::uint64_t{1} << left);
-    for (std::int32_t row = top; row <= bottom; ++row)
-        tiles_[static_cast<std::size_t>(row)] |= bits;
+// What of the band lights can reach.
+QRect StandardSurface::bandRect(std::size_t band) const {
+    const auto top = static_cast<std::int32_t>(band) * kBandRows;
+    const ColumnRange& columns = plan_.BandColumns[band];
+    return {columns.Left, top, columns.Right - columns.Left, std::min(kBandRows, plan_.Height - top)};
+}
+
+void StandardSurface::markUnitTiles(const PlanUnit& unit) {
+    for (std::int32_t t = 0; t < unit.TileCount; ++t) {
+        const TileRow& tiles = plan_.Tiles[static_cast<std::size_t>(unit.FirstTile + t)];
+        tiles_[static_cast<std::size_t>(tiles.Row)] |= tiles.Bits;
+    }
 }
 
 // Runs of tiles in a row become one rectangle.

@@ -7,9 +7,6 @@
 
 #include <array>
 #include <future>
-#include <memory>
-#include <optional>
-#include <vector>
 
 namespace {
 
@@ -55,24 +52,10 @@ struct Speaker {
     }
 };
 
-// Holds reports back until it is known whether the reading that made them counts.
-class HeldFailures : public FailureReport {
-public:
-    void ErrReport(std::string_view description, std::string_view procedure, int line) override {
-        held_.push_back({std::string(description), std::string(procedure), line});
-    }
-    void passOn(FailureReport& failures) const {
-        for (const Held& report : held_)
-            failures.ErrReport(report.description, report.procedure, report.line);
-    }
-
-private:
-    struct Held {
-        std::string description;
-        std::string procedure;
-        int line;
-    };
-    std::vector<Held> held_;
+// One load: how it speaks and what it uses.
+struct LoadFrame {
+    Speaker speaker;
+    const EditorFileContext& context;
 };
 
 // The checksum of a text, computed on a second thread while the records are read. The first start counts.
@@ -94,30 +77,26 @@ private:
     std::future<std::string> computed_;
 };
 
-enum class Gate { Body, UnknownVersion };
-struct BodyResult {
-    Gate gate = Gate::UnknownVersion;
-    bool read = false;
-};
+enum class BodyResult { Read, Damaged, UnknownVersion };
 
 template <typename Node>
-BodyResult readThroughGate(const Node& root, const ZephSettings& settings, const ZephPathService& paths,
-                           FailureReport& failures, ZephSimulation& simulation) {
+BodyResult readThroughGate(const Node& root, const EditorFileContext& context, ZephSimulation& simulation) {
     const std::string version = root.text("zephSaveFileVersion").value_or("");
     simulation.zephSaveFileVersion = version;
     const auto row = std::find_if(kVersions.begin(), kVersions.end(),
                                   [&](const VersionRow& known) { return known.version == version; });
-    if (row == kVersions.end()) return {};
+    if (row == kVersions.end()) return BodyResult::UnknownVersion;
     simulation.FileUpgraded = !row->version3;
+    const auto& [settings, paths, host, failures, watcher] = context;
     const bool read = row->version3 ? LoadVisualizerBody300(root, settings, paths, failures, simulation)
                                     : LoadVisualizerBody200(root, settings, paths, failures, simulation);
-    return {Gate::Body, read};
+    return read ? BodyResult::Read : BodyResult::Damaged;
 }
 
-bool told(const BodyResult& body, const Speaker& speaker) {
-    if (body.gate == Gate::UnknownVersion) speaker.say(kIncompatibleVersion);
-    if (body.gate == Gate::Body && !body.read) speaker.say(kBodyErrors);
-    return body.read;
+bool told(BodyResult body, const Speaker& speaker) {
+    if (body == BodyResult::UnknownVersion) speaker.say(kIncompatibleVersion);
+    if (body == BodyResult::Damaged) speaker.say(kBodyErrors);
+    return body == BodyResult::Read;
 }
 
 // Empties the document for a file. A file without a background has no canvas to speak of, whatever was open before.
@@ -127,122 +106,104 @@ void emptyForFile(ZephSimulation& simulation, DocumentWatcher& watcher) {
     simulation.Background.EditorHeightTwips = 0;
 }
 
-// The quick form reads into a document of its own, since a text can turn out unusual at its very end. Nothing then.
-std::optional<BodyResult> readQuickly(const SourceText& text, PendingChecksum& checksum,
-                                      const EditorFileContext& context, ZephSimulation& simulation) {
-    XmlScanner scanner(text.view());
-    const ScannedNode root = scanner.root();
-    if (!root || root.name() != kRootName) return std::nullopt;
-    if (const auto stored = root.text("Chksum")) checksum.start(text.view(), scanner.rootNameOffset(), *stored);
-    const auto fresh = std::make_unique<ZephSimulation>();
-    NoWatcher nobody;
-    emptyForFile(*fresh, nobody);
-    fresh->FixtureLedDefault = simulation.FixtureLedDefault;
-    HeldFailures failures;
-    const BodyResult body = readThroughGate(root, context.settings, context.paths, failures, *fresh);
-    if (!scanner.finish()) return std::nullopt;
-
-    emptyForFile(simulation, context.watcher);
-    fresh->FilePath = std::move(simulation.FilePath);
-    fresh->FileName = std::move(simulation.FileName);
-    simulation = std::move(*fresh);
-    failures.passOn(context.failures);
-    return body;
+// The steps behind the parse, the same for both forms. rootName: the offset of the root's name in the text.
+template <typename Node>
+bool readDocument(const Node& root, std::string_view text, std::size_t rootName, PendingChecksum& checksum,
+                  const LoadFrame& load, ZephSimulation& simulation) {
+    if (root.name() != kRootName) {
+        load.speaker.say(kInvalidRoot);
+        return false;
+    }
+    emptyForFile(simulation, load.context.watcher);
+    if (const auto stored = root.text("Chksum")) checksum.start(text, rootName, *stored);
+    const BodyResult body = readThroughGate(root, load.context, simulation);
+    simulation.ChecksumMismatch = checksum.differs();
+    return told(body, load.speaker);
 }
 
-std::optional<BodyResult> readGenerally(const SourceText& text, PendingChecksum& checksum, const Speaker& speaker,
-                                        const EditorFileContext& context, ZephSimulation& simulation) {
+bool readGenerally(const SourceText& text, PendingChecksum& checksum, const LoadFrame& load,
+                   ZephSimulation& simulation) {
     pugi::xml_document document;
     const std::string_view utf8 = text.view();
     const pugi::xml_parse_result parsed =
         document.load_buffer(utf8.data(), utf8.size(), pugi::parse_default, pugi::encoding_utf8);
     if (parsed.status == pugi::status_out_of_memory) throw std::bad_alloc();
-    const pugi::xml_node rootNode = document.document_element();
-    if (!parsed || !rootNode) {
-        speaker.say(kInvalidXml);
-        return std::nullopt;
+    const pugi::xml_node root = document.document_element();
+    if (!parsed || !root) {
+        load.speaker.say(kInvalidXml);
+        return false;
     }
-    const XmlNode root(rootNode);
-    if (root.name() != kRootName) {
-        speaker.say(kInvalidRoot);
-        return std::nullopt;
-    }
-    emptyForFile(simulation, context.watcher);
-    if (const auto stored = root.text("Chksum")) {
-        checksum.start(utf8, static_cast<std::size_t>(rootNode.offset_debug()), *stored);
-    }
-    return readThroughGate(root, context.settings, context.paths, context.failures, simulation);
+    const auto rootName = static_cast<std::size_t>(root.offset_debug());
+    return readDocument(XmlNode(root), utf8, rootName, checksum, load, simulation);
 }
 
-bool loadSource(SourceText text, TextReading reading, const Speaker& speaker, const EditorFileContext& context,
-                ZephSimulation& simulation) {
+bool loadSource(SourceText text, TextReading reading, const LoadFrame& load, ZephSimulation& simulation) {
     PendingChecksum checksum;  // stands behind the text, which it reads until it is gone
-    std::optional<BodyResult> body;
-    if (reading != TextReading::GeneralOnly) body = readQuickly(text, checksum, context, simulation);
-    if (!body && reading != TextReading::QuickOnly) {
-        // A text that the quick form began to hash is UTF-8 already, and must stay where it is.
-        if (!checksum.started() && !decodeSource(text)) {
-            speaker.say(kInvalidXml);
-            return false;
+    if (reading != TextReading::GeneralOnly) {
+        XmlScanner scanner(text.view());
+        const ScannedNode root = scanner.root();
+        const std::size_t rootName = scanner.rootNameOffset();
+        if (root) {
+            // Before the first look at the whole text, for nothing takes longer than the checksum.
+            if (const auto stored = root.text("Chksum")) checksum.start(text.view(), rootName, *stored);
         }
-        body = readGenerally(text, checksum, speaker, context, simulation);
+        if (root && XmlScanner::isUsual(text.view())) {
+            return readDocument(root, text.view(), rootName, checksum, load, simulation);
+        }
+        if (reading == TextReading::QuickOnly) return false;
     }
-    if (!body) return false;
-    simulation.ChecksumMismatch = checksum.differs();
-    return told(*body, speaker);
+    // A text that is being hashed is UTF-8 already, and must stay where it is.
+    if (!checksum.started() && !decodeSource(text)) {
+        load.speaker.say(kInvalidXml);
+        return false;
+    }
+    return readGenerally(text, checksum, load, simulation);
 }
 
-Speaker speakerFor(bool showErrors, const EditorFileContext& context, const ZephSimulation& simulation) {
-    return {showErrors, context.host, simulation.FilePath + simulation.FileName};
-}
-
-// An exception out of the parse has its own message; it is not one of a record.
-bool loadOrSay(const Speaker& speaker, const EditorFileContext& context, auto&& load) try {
-    return load();
-} catch (...) {
-    reportCaughtFailure(context.failures, kLoadModule, "ZephLoadVisualizerXML", __LINE__);
-    speaker.say(kBadLoad);
-    return false;
+// What every entry does around the load itself: the flags of the last load go, and an exception out of the parse has
+// a message of its own, since it is not one of a record.
+bool guardedLoad(bool showErrors, const EditorFileContext& context, ZephSimulation& simulation, auto&& load) {
+    const LoadFrame frame{{showErrors, context.host, simulation.FilePath + simulation.FileName}, context};
+    try {
+        simulation.ChecksumMismatch = false;
+        simulation.FileUpgraded = false;
+        return load(frame);
+    } catch (...) {
+        reportCaughtFailure(context.failures, kLoadModule, "ZephLoadVisualizerXML", __LINE__);
+        frame.speaker.say(kBadLoad);
+        return false;
+    }
 }
 
 }  // namespace
 
 bool loadEditorText(std::string_view text, TextReading reading, bool showErrors, const EditorFileContext& context,
                     ZephSimulation& simulation) {
-    const Speaker speaker = speakerFor(showErrors, context, simulation);
-    return loadOrSay(speaker, context, [&] {
-        simulation.ChecksumMismatch = false;
-        simulation.FileUpgraded = false;
-        return loadSource(SourceText(text), reading, speaker, context, simulation);
+    return guardedLoad(showErrors, context, simulation, [&](const LoadFrame& frame) {
+        return loadSource(SourceText(text), reading, frame, simulation);
     });
 }
 
 bool ZephLoadVisualizerXML(bool showErrors, const EditorFileContext& context, ZephSimulation& simulation) {
-    const Speaker speaker = speakerFor(showErrors, context, simulation);
-    return loadOrSay(speaker, context, [&] {
-        simulation.ChecksumMismatch = false;
-        simulation.FileUpgraded = false;
+    return guardedLoad(showErrors, context, simulation, [&](const LoadFrame& frame) {
         SourceText text;
-        const FileReading reading = readWholeFile(speaker.file, text);
+        const FileReading reading = readWholeFile(frame.speaker.file, text);
         if (reading != FileReading::Read) {
-            speaker.say(reading == FileReading::Missing ? kFileNotFound : kBadLoad);
+            frame.speaker.say(reading == FileReading::Missing ? kFileNotFound : kBadLoad);
             return false;
         }
-        return loadSource(std::move(text), TextReading::QuickThenGeneral, speaker, context, simulation);
+        return loadSource(std::move(text), TextReading::QuickThenGeneral, frame, simulation);
     });
 }
 
 bool ZephLoadVisualizerXML(const pugi::xml_document& stored, bool showErrors, const EditorFileContext& context,
                            ZephSimulation& simulation) {
-    const Speaker speaker = speakerFor(showErrors, context, simulation);
-    return loadOrSay(speaker, context, [&] {
-        simulation.ChecksumMismatch = false;
-        simulation.FileUpgraded = false;
+    return guardedLoad(showErrors, context, simulation, [&](const LoadFrame& frame) {
         const XmlNode root(stored.document_element());
         if (!root || root.name() != kRootName) {
-            speaker.say(root ? kInvalidRoot : kInvalidXml);
+            frame.speaker.say(root ? kInvalidRoot : kInvalidXml);
             return false;
         }
-        return told(readThroughGate(root, context.settings, context.paths, context.failures, simulation), speaker);
+        return told(readThroughGate(root, context, simulation), frame.speaker);
     });
 }

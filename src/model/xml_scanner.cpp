@@ -1,20 +1,19 @@
 #include "model/xml_scanner.h"
 
 #include <array>
+#include <bit>
 #include <cstring>
 
 namespace {
 
-enum : std::uint8_t { kNameStart = 1, kNamePart = 2, kValuePart = 4 };
+enum : std::uint8_t { kNameStart = 1, kNamePart = 2 };
 
 constexpr std::array<std::uint8_t, 256> kClasses = [] {
     std::array<std::uint8_t, 256> classes{};
-    for (unsigned code = 0x20; code < 256; ++code) {
+    for (unsigned code = 0; code < 256; ++code) {
         const bool letter = (code >= 'A' && code <= 'Z') || (code >= 'a' && code <= 'z') || code == '_';
         const bool digit = code >= '0' && code <= '9';
-        const bool special = code == '"' || code == '&' || code == '<';
-        classes[code] = static_cast<std::uint8_t>((letter ? kNameStart : 0) | (letter || digit ? kNamePart : 0) |
-                                                  (special ? 0 : kValuePart));
+        classes[code] = static_cast<std::uint8_t>((letter ? kNameStart : 0) | (letter || digit ? kNamePart : 0));
     }
     return classes;
 }();
@@ -31,6 +30,38 @@ std::uint64_t eightBytes(const char* at) noexcept {
     std::uint64_t bytes;
     std::memcpy(&bytes, at, sizeof bytes);
     return bytes;
+}
+
+// Whether the text goes on with a name that itself stands in the text, so that both may be read past their ends.
+bool sameName(const char* at, std::string_view name) noexcept {
+    for (std::size_t done = 0; done < name.size(); done += 8) {
+        const std::uint64_t difference = eightBytes(at + done) ^ eightBytes(name.data() + done);
+        const std::size_t left = name.size() - done;
+        if ((left < 8 ? difference << (64 - 8 * left) : difference) != 0) return false;
+    }
+    return true;
+}
+
+constexpr std::uint64_t kEachByte = 0x0101010101010101;
+
+// The high bit of the first byte below the limit (up to 128), and of no byte before it; what stands behind is noise.
+constexpr std::uint64_t bytesBelow(std::uint64_t bytes, std::uint64_t limit) noexcept {
+    return (bytes - kEachByte * limit) & ~bytes & (kEachByte * 0x80);
+}
+constexpr std::uint64_t bytesEqual(std::uint64_t bytes, char letter) noexcept {
+    return bytesBelow(bytes ^ (kEachByte * static_cast<unsigned char>(letter)), 1);
+}
+
+// The first character that ends a plain piece of a value: a quote, '&', or what no usual value has. Eight at a time;
+// the zero bytes behind the text end it.
+const char* endOfValuePart(const char* at) noexcept {
+    static_assert(std::endian::native == std::endian::little, "the first character is taken for the lowest byte");
+    for (;; at += 8) {
+        const std::uint64_t bytes = eightBytes(at);
+        const std::uint64_t ends =
+            bytesBelow(bytes, ' ') | bytesEqual(bytes, '"') | bytesEqual(bytes, '&') | bytesEqual(bytes, '<');
+        if (ends != 0) return at + std::countr_zero(ends) / 8;
+    }
 }
 
 // Compares with a literal of a length known at compile time: a few wide loads, which the slack behind the text allows.
@@ -54,6 +85,30 @@ bool takePlainLong(const char*& at, std::int32_t& value) noexcept {
     return at != first && digit > 9;
 }
 
+bool skipPlainLong(const char*& at) noexcept {
+    if (*at == '-') ++at;
+    const char* first = at;
+    while (static_cast<unsigned>(*at) - '0' <= 9)
+        ++at;
+    return at != first;
+}
+
+// A point in the one spelling that nearly all have; the procedures take its four numbers. On false, at is anywhere.
+template <typename Slot, typename Type, typename X, typename Y>
+bool passPlainPoint(const char*& at, Slot slot, Type type, X x, Y y) noexcept {
+    const auto part = [&at](const auto& before, auto& takeNumber) {
+        if (!startsWith(at, before)) return false;
+        at += sizeof before - 1;
+        return takeNumber(at);
+    };
+    if (!part("<DrawPoint ID=\"", slot) || !part("\" Type=\"", type) || !part("\" X=\"", x) || !part("\" Y=\"", y) ||
+        !startsWith(at, "\"/>")) {
+        return false;
+    }
+    at += 3;
+    return true;
+}
+
 struct Entity {
     std::string_view spelling;
     char meaning;
@@ -62,6 +117,13 @@ struct Entity {
 constexpr std::array kEntities{Entity{"&amp;", '&'},  Entity{"&lt;", '<'},    Entity{"&gt;", '>'},
                                Entity{"&quot;", '"'}, Entity{"&apos;", '\''}, Entity{"&#13;", '\r'},
                                Entity{"&#10;", '\n'}, Entity{"&#9;", '\t'}};
+
+// The entity at the beginning of the text, or nullptr. Kept out of the loops that call it: hardly a value has one.
+[[gnu::noinline]] const Entity* findEntity(std::string_view text) noexcept {
+    const auto* found = std::find_if(kEntities.data(), kEntities.data() + kEntities.size(),
+                                     [&](const Entity& known) { return text.starts_with(known.spelling); });
+    return found == kEntities.data() + kEntities.size() ? nullptr : found;
+}
 
 }  // namespace
 
@@ -82,15 +144,14 @@ ScannedNode ScannedNode::nextElement() const {
 std::optional<std::string_view> ScannedNode::attribute(std::string_view attributeName) const {
     const XmlScanner::Attribute* found = scanner_->find(depth_, attributeName);
     if (!found) return std::nullopt;
-    if (found->hasEntity) scanner_->fail();  // a number or a flag with an entity in it: not worth a second spelling
+    if (found->hasEntity) return scanner_->decodedValues_.emplace_back(XmlScanner::decoded(*found));
     return found->value;
 }
 
 std::optional<std::string> ScannedNode::text(std::string_view attributeName) const {
     const XmlScanner::Attribute* found = scanner_->find(depth_, attributeName);
     if (!found) return std::nullopt;
-    if (found->hasEntity) return scanner_->decoded(*found);
-    return std::string(found->value);
+    return found->hasEntity ? XmlScanner::decoded(*found) : std::string(found->value);
 }
 
 void ScannedNode::takePlainPoints(ZephFixture& fixture) const {
@@ -100,17 +161,14 @@ void ScannedNode::takePlainPoints(ZephFixture& fixture) const {
         const char* at = scanner_->at_;
         std::int32_t slot = 0;
         ZephDrawPoint point;
-        const auto takeLong = [&at](std::int32_t& value, const auto& before) {
-            if (!startsWith(at, before)) return false;
-            at += sizeof before - 1;
-            return takePlainLong(at, value);
+        const auto into = [](std::int32_t& value) {
+            return [&value](const char*& digits) { return takePlainLong(digits, value); };
         };
-        const bool plain = takeLong(slot, "<DrawPoint ID=\"") && takeLong(point.Type, "\" Type=\"") &&
-                           takeLong(point.X, "\" X=\"") && takeLong(point.Y, "\" Y=\"") && startsWith(at, "\"/>");
+        const bool plain = passPlainPoint(at, into(slot), into(point.Type), into(point.X), into(point.Y));
         if (!plain || !fixture.DrawPoints.contains(slot)) return;
         fixture.PointCount = slot;
         fixture.DrawPoints[slot] = point;
-        scanner_->at_ = at + 3;
+        scanner_->at_ = at;
     }
 }
 
@@ -152,10 +210,12 @@ ScannedNode XmlScanner::root() {
     return {*this, step() == Tag::Start ? 1 : 0};
 }
 
-bool XmlScanner::finish() {
-    passOver(1);
-    skipWhite();
-    return !unusual_ && open_ == 0 && at_ == end_;
+bool XmlScanner::isUsual(std::string_view text) {
+    XmlScanner scanner(text);
+    if (!scanner.root()) return false;
+    scanner.passOver(1);
+    scanner.skipWhite();
+    return !scanner.unusual_ && scanner.at_ == scanner.end_;
 }
 
 // Reads the next tag of the innermost open element, or the root's.
@@ -179,10 +239,11 @@ void XmlScanner::readStartTag() {
     if (open_ == kMaxDepth) return fail();
     Frame& entered = frame(++open_);
     entered.name = takeName();
+    entered.known = entered.attributeCount;
     entered.attributeCount = 0;
     entered.next = 0;
     if (entered.name.empty()) return fail();
-    for (std::uint64_t seen = 0;;) {
+    for (;;) {
         if (*at_ == '>') {
             ++at_;
             return;
@@ -195,36 +256,49 @@ void XmlScanner::readStartTag() {
         }
         if (*at_ != ' ') return fail();
         ++at_;
-        if (!readAttribute(entered, seen)) return fail();
+        if (!readAttribute(entered)) return fail();
     }
 }
 
-bool XmlScanner::readAttribute(Frame& entered, std::uint64_t& seen) {
-    const std::string_view name = takeName();
+// The name and "=\"" behind it. False when it is none, or the second of its name: the general parser takes the first.
+bool XmlScanner::takeAttributeName(Frame& entered, std::string_view& name) {
+    const auto count = static_cast<std::size_t>(entered.attributeCount);
+    if (entered.attributeCount < entered.known) {
+        // As long as the names are those of the element before, they are names, and no two of them are equal.
+        name = entered.attributes[count].name;
+        const char* behind = at_ + name.size();
+        if (end_ - at_ > static_cast<std::ptrdiff_t>(name.size()) && sameName(at_, name) && behind[0] == '=' &&
+            behind[1] == '"') {
+            at_ = behind + 2;
+            return true;
+        }
+        entered.known = 0;
+    }
+    name = takeName();
     if (name.empty() || at_[0] != '=' || at_[1] != '"' || entered.attributeCount == kMaxAttributes) return false;
     at_ += 2;
-    // The general parser takes the first of two equal names; one bit for each name seen spares comparing them all.
-    const unsigned mix = static_cast<unsigned>(name.size() * 11 + static_cast<unsigned char>(name.front()) * 5u +
-                                               static_cast<unsigned char>(name.back()));
-    const std::uint64_t bit = std::uint64_t{1} << (mix & 63);
-    const auto count = static_cast<std::size_t>(entered.attributeCount);
-    if ((seen & bit) != 0) {
-        for (std::size_t earlier = 0; earlier < count; ++earlier) {
-            if (entered.attributes[earlier].name == name) return false;
-        }
+    for (std::size_t earlier = 0; earlier < count; ++earlier) {
+        if (entered.attributes[earlier].name == name) return false;
     }
-    seen |= bit;
+    return true;
+}
+
+bool XmlScanner::readAttribute(Frame& entered) {
+    std::string_view name;
+    if (!takeAttributeName(entered, name)) return false;
     const char* first = at_;
     bool hasEntity = false;
     for (;;) {
-        while (isClass(*at_, kValuePart))
-            ++at_;
+        at_ = endOfValuePart(at_);
         if (*at_ != '&') break;
+        const Entity* entity = findEntity({at_, static_cast<std::size_t>(end_ - at_)});
+        if (!entity) return false;
         hasEntity = true;
-        ++at_;
+        at_ += entity->spelling.size();
     }
     if (*at_ != '"') return false;
-    entered.attributes[count] = {name, {first, static_cast<std::size_t>(at_ - first)}, hasEntity};
+    entered.attributes[static_cast<std::size_t>(entered.attributeCount)] = {
+        name, {first, static_cast<std::size_t>(at_ - first)}, hasEntity};
     ++entered.attributeCount;
     ++at_;
     return true;
@@ -239,35 +313,49 @@ void XmlScanner::readEndTag() {
 
 // Leaves the element of this depth and everything in it.
 void XmlScanner::passOver(int depth) {
-    while (open_ >= depth && !unusual_)
+    while (open_ >= depth && !unusual_) {
+        skipPlainPoints();
         step();
+    }
+}
+
+void XmlScanner::skipPlainPoints() noexcept {
+    for (;;) {
+        skipWhite();
+        const char* at = at_;
+        const auto skip = [](const char*& digits) { return skipPlainLong(digits); };  // a pointer would not be inlined
+        if (!passPlainPoint(at, skip, skip, skip, skip)) return;
+        at_ = at;
+    }
 }
 
 const XmlScanner::Attribute* XmlScanner::find(int depth, std::string_view attributeName) {
     Frame& searched = frame(depth);
-    for (int tried = 0; tried < searched.attributeCount; ++tried) {
-        const int candidate = (searched.next + tried) % searched.attributeCount;
-        const Attribute& attribute = searched.attributes[static_cast<std::size_t>(candidate)];
-        if (attribute.name != attributeName) continue;
-        searched.next = candidate + 1 == searched.attributeCount ? 0 : candidate + 1;
-        return &attribute;
+    const auto sought = [&](const Attribute& attribute) {
+        return attribute.name.size() == attributeName.size() && attribute.name.front() == attributeName.front() &&
+               attribute.name == attributeName;
+    };
+    const auto begin = searched.attributes.begin();
+    const auto end = begin + searched.attributeCount;
+    auto found = std::find_if(begin + searched.next, end, sought);
+    if (found == end) {
+        const auto wrapped = begin + searched.next;
+        found = std::find_if(begin, wrapped, sought);
+        if (found == wrapped) return nullptr;
     }
-    return nullptr;
+    // Many a reader asks twice, whether it is there and what it is: so the next search begins at this one.
+    searched.next = static_cast<int>(found - begin);
+    return &*found;
 }
 
-std::optional<std::string> XmlScanner::decoded(const Attribute& attribute) {
+std::string XmlScanner::decoded(const Attribute& attribute) {
     std::string text;
     for (std::string_view rest = attribute.value; !rest.empty();) {
         const std::size_t plain = std::min(rest.find('&'), rest.size());
         text.append(rest.substr(0, plain));
         rest.remove_prefix(plain);
         if (rest.empty()) break;
-        const auto entity = std::find_if(kEntities.begin(), kEntities.end(),
-                                         [&](const Entity& known) { return rest.starts_with(known.spelling); });
-        if (entity == kEntities.end()) {
-            fail();
-            return text;
-        }
+        const Entity* entity = findEntity(rest);  // there is one, or the attribute had not been read
         text.push_back(entity->meaning);
         rest.remove_prefix(entity->spelling.size());
     }

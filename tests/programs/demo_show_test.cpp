@@ -174,7 +174,8 @@ TEST(DemoShow, EndsInTheDarkWithRibbonsThatTakeOrders) {
     EXPECT_EQ(lit(), 0U);
     for (std::size_t group = 1; group < rig.tables.RGBData.size(); ++group) {
         for (int colour = 1; colour <= 3; ++colour) {
-            EXPECT_NE(rig.tables.RGBData[group].Mode[static_cast<std::size_t>(colour)], 4) << rig.tables.RGBData[group].Key;
+            EXPECT_NE(rig.tables.RGBData[group].Mode[static_cast<std::size_t>(colour)], 4)
+                << rig.tables.RGBData[group].Key;
         }
     }
 }

@@ -1,6 +1,9 @@
 #include "programs/tool/demo_show_command.h"
 #include "programs/tool/info_command.h"
 #include "programs/tool/options.h"
+#include "programs/tool/record_command.h"
+#include "programs/tool/render_command.h"
+#include "programs/tool/send_command.h"
 #include "programs/tool/table_command.h"
 #include "programs/tool/trace_command.h"
 
@@ -13,11 +16,20 @@
 
 namespace {
 
+struct Command {
+    std::string_view name;
+    int (*run)(const ToolOptions& options);
+};
+
+constexpr Command kCommands[] = {{"info", runInfo},         {"table", runTable}, {"trace", runTrace},
+                                 {"render", runRender},     {"send", runSend},   {"record", runRecord},
+                                 {"demo-show", runDemoShow}};
+
 int runCommand(const ToolOptions& options) {
-    if (options.command == "info") return runInfo(options);
-    if (options.command == "table") return runTable(options);
-    if (options.command == "demo-show") return runDemoShow(options);
-    return runTrace(options);
+    for (const Command& command : kCommands) {
+        if (command.name == options.command) return command.run(options);
+    }
+    return 2;
 }
 
 }  // namespace
