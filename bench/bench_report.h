@@ -32,20 +32,30 @@ public:
     std::vector<Goal> goals;
 };
 
+template <typename Work>
+double microsecondsOf(Work work) {
+    using SteadyClock = std::chrono::steady_clock;
+    const SteadyClock::time_point start = SteadyClock::now();
+    work();
+    return std::chrono::duration<double, std::micro>(SteadyClock::now() - start).count();
+}
+
+// values is not empty.
+inline double medianOf(std::vector<double> values) {
+    const auto middle = values.begin() + static_cast<std::ptrdiff_t>(values.size() / 2);
+    std::nth_element(values.begin(), middle, values.end());
+    return *middle;
+}
+
 // The median time of `runs` calls, in microseconds. Before each, `prepare` runs outside the clock. runs is at least 1.
 template <typename Prepare, typename Work>
 double medianMicroseconds(int runs, Prepare prepare, Work work) {
-    using SteadyClock = std::chrono::steady_clock;
     std::vector<double> times;
     for (int run = 0; run < runs; ++run) {
         prepare();
-        const SteadyClock::time_point start = SteadyClock::now();
-        work();
-        times.push_back(std::chrono::duration<double, std::micro>(SteadyClock::now() - start).count());
+        times.push_back(microsecondsOf(work));
     }
-    const auto middle = times.begin() + static_cast<std::ptrdiff_t>(times.size() / 2);
-    std::nth_element(times.begin(), middle, times.end());
-    return *middle;
+    return medianOf(std::move(times));
 }
 
 template <typename Work>

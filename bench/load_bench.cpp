@@ -59,9 +59,6 @@ void benchLoad(BenchReport& report) {
     const double save =
         medianMicroseconds(kRuns, [&] { ZephSaveVisualizerXML("21.11.26 10:00:00", context, *simulation); });
     const double build = medianMicroseconds(kRuns, [&] { keepResult(editorText(*simulation, paths, "now")); });
-    const double md5 =
-        medianMicroseconds(kRuns, [&] { keepResult(QCryptographicHash::hash(wideBytes, QCryptographicHash::Md5)); });
-
     const auto loaded = std::make_unique<ZephSimulation>();
     const auto reset = [&] {
         loaded->FilePath = simulation->FilePath;
@@ -70,7 +67,16 @@ void benchLoad(BenchReport& report) {
     bool good = true;
     const auto loadFile = [&] { good = ZephLoadVisualizerXML(true, context, *loaded) && good; };
     loaded->FileName = "limit.zee";
-    const double withChecksum = medianMicroseconds(kRuns, reset, loadFile);
+    // In turns, so that what else the machine does meanwhile falls on both alike.
+    std::vector<double> md5Times, loadTimes, ratios;
+    for (int run = 0; run < kRuns; ++run) {
+        md5Times.push_back(
+            microsecondsOf([&] { keepResult(QCryptographicHash::hash(wideBytes, QCryptographicHash::Md5)); }));
+        reset();
+        loadTimes.push_back(microsecondsOf(loadFile));
+        ratios.push_back(loadTimes.back() / md5Times.back());
+    }
+    const double loadRatio = medianOf(ratios);
     good = good && !loaded->ChecksumMismatch && loaded->Fixtures == simulation->Fixtures;
     loaded->FileName = "plain.zee";
     good = good && replaceWholeFile(simulation->FilePath + "plain.zee", plain);
@@ -85,8 +91,8 @@ void benchLoad(BenchReport& report) {
     });
 
     const std::string withGroup = "Limit document (1024 x 256 points, 16,384 channels), checksum verified";
-    report.row(withGroup, "MD5 alone over the same text", md5);
-    report.row(withGroup, "load the file, checksum verified", withChecksum);
+    report.row(withGroup, "MD5 alone over the same text", medianOf(md5Times));
+    report.row(withGroup, "load the file, checksum verified", medianOf(loadTimes));
     report.row(withGroup, "save the file, checksum included", save);
     const std::string group = "Limit document without a checksum";
     report.row(group, "load the file", withoutChecksum);
@@ -95,7 +101,7 @@ void benchLoad(BenchReport& report) {
     report.row(group, "QXmlStreamReader, attributes only", stream);
     report.row(group, "build the text", build);
     report.row(group, "empty the loaded document", resetOnly);
-    report.goal("load", ratioText(withChecksum / md5), "at most 1.3 x MD5 alone", good && withChecksum <= 1.3 * md5);
+    report.goal("load", ratioText(loadRatio), "at most 1.3 x MD5 alone", good && loadRatio <= 1.3);
     report.goal("load-plain", ratioText(stream / withoutChecksum), "at least 8 x faster than QXmlStreamReader",
                 good && stream >= 8 * withoutChecksum);
     report.goal("save", std::to_string(static_cast<int>(save / 1000)) + " ms", "at most 250 ms with the checksum",

@@ -39,7 +39,7 @@ install_packages() {
 
 # What building and running takes.
 BUILD_PACKAGES=(g++ cmake ninja-build ccache pkg-config qt6-base-dev libpugixml-dev libgtest-dev libgmock-dev
-    libbenchmark-dev libpixman-1-dev)
+    libpixman-1-dev)
 # What looking at the result takes besides: the platform plugin's own needs come with qt6-base-dev.
 RUN_PACKAGES=(ffmpeg)
 # What checking takes besides.

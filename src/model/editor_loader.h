@@ -34,6 +34,6 @@ struct EditorFileContext {
 enum class TextReading { QuickThenGeneral, GeneralOnly, QuickOnly };
 
 // As the file of that text, already in memory. The name stands in the messages. QuickOnly gives false, silently and
-// without a change, where the quick form gives up.
+// without touching a record, where the quick form gives up.
 [[nodiscard]] bool loadEditorText(std::string_view text, TextReading reading, bool showErrors,
                                   const EditorFileContext& context, ZephSimulation& simulation);
