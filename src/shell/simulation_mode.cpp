@@ -78,15 +78,13 @@ void mnuSimulationMode_Click(Program& program, SimulationFace& face) {
 }
 
 void ZephSwitchMode(int newState, Program& program, SimulationFace& face) {
-    const bool wasSimulating = program.simulating();
-    if (wasSimulating) ZephCleanUpAfterSimulation(program, face);
+    if (program.simulating()) ZephCleanUpAfterSimulation(program, face);
     if (newState == kStateSimulation) {
         clearLevelDumps(program.receive.Stream.Dumps);
         program.seams.host.setBusyPointer(true);
         const bool started = startStandardEngine(program, face);
         program.seams.host.setBusyPointer(false);
         if (started) return;
-        face.setTimer(false, kStandardTimerMs);
     }
     face.setTimer(false, kStandardTimerMs);
     program.ZephUIState = kStateSelectFixture;
@@ -108,8 +106,7 @@ void ZephCleanUpAfterSimulation(Program& program, SimulationFace& face) {
     face.showQueueGauge(false);
     program.seams.host.setStatusPanel(3, "");
     ZephRebuildStaticFixtureBulbs(*program.simulation, *program.masks, *program.bulbs);
-    // The window must let go of the frame before the surface gives its pixels back.
-    face.redrawObjects();
+    face.showFrames(program.picBuffer);  // the window must let go of the frame before its pixels are given back
     program.surface.release();
     eraseRenderTables(program.tables);
 }

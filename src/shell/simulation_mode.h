@@ -12,7 +12,7 @@ public:
     virtual ~SimulationFace() = default;
     virtual void setTimer(bool on, int intervalMs) = 0;  // hrTimer1
     virtual void showQueueGauge(bool shown) = 0;         // prbQueueLen
-    virtual void showFrames(const QImage& frame) = 0;    // picMain shows the engine's frame from here on
+    virtual void showFrames(const QImage& frame) = 0;    // picMain shows this image from here on
     virtual void redrawObjects() = 0;                    // picMain shows the editor's canvas
     virtual void SetControlsForSimulation(bool on) = 0;
     virtual void layOutForEditor() = 0;

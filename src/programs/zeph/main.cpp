@@ -25,6 +25,7 @@ int main(int argc, char** argv) {
     QApplication application(argc, argv);
     QApplication::setApplicationName("zeph");
     applyLook(application);
+    QApplication::setWindowIcon(simulationIcon());
 
     WindowHost host;
     const SystemClock clock;
