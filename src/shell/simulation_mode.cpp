@@ -11,8 +11,8 @@ void refuseBackwardClock(Host& host) {
         "The visualizer can not enter simulation mode since Windows is reporting that time is running backwards.  This "
         "is usually caused by not having rebooted the computer in over 24 days.\r\n\r\n"
         "Please save your work and then re-boot your computer.  Some computers when shut down do not actually shut "
-        "down "
-        "but enter sleep mode.  This is not the same as a reboot.",
+        ""
+        "down but enter sleep mode.  This is not the same as a reboot.",
         BoxIcon::Critical);
 }
 
@@ -58,10 +58,7 @@ bool startStandardEngine(Program& program, SimulationFace& face) {
 }  // namespace
 
 void mnuSimulationMode_Click(Program& program, SimulationFace& face) {
-    if (program.simulating()) {
-        EndSimulation(program, face);
-        return;
-    }
+    if (program.simulating()) return;
     if (program.seams.clock.timeGetTime() < 0) {
         refuseBackwardClock(program.seams.host);
         ZephSwitchMode(kStateSelectFixture, program, face);
@@ -81,6 +78,7 @@ void ZephSwitchMode(int newState, Program& program, SimulationFace& face) {
     if (program.simulating()) ZephCleanUpAfterSimulation(program, face);
     if (newState == kStateSimulation) {
         clearLevelDumps(program.receive.Stream.Dumps);
+        program.receive.Stream.ZephStackBuffer.clear();  // only what arrives from now on counts
         program.seams.host.setBusyPointer(true);
         const bool started = startStandardEngine(program, face);
         program.seams.host.setBusyPointer(false);
@@ -98,6 +96,7 @@ void EndSimulation(Program& program, SimulationFace& face) {
     face.setTimer(false, kStandardTimerMs);
     restoreAssembledPoints(*program.simulation, *program.states);
     ZephSwitchMode(kStateSelectFixture, program, face);
+    program.receive.Stream.ZephStackBuffer.clear();
     program.receive.Stream.ZephPayloadSerial = 0;
     face.layOutForEditor();
 }

@@ -19,7 +19,7 @@ public:
     virtual void CheckEnable() = 0;
 };
 
-// Enters simulation; while it runs, leaves it.
+// Enters simulation; does nothing while it runs.
 void mnuSimulationMode_Click(Program& program, SimulationFace& face);
 
 // newState: kStateSimulation or kStateSelectFixture, to which every failure returns.

@@ -4,14 +4,19 @@
 #include "shell/main_window.h"
 #include "shell/startup.h"
 
+#include <QAction>
 #include <QApplication>
 
 namespace {
 
 constexpr std::size_t kMostArguments = 10;
 
+// For demonstrations: the simulation runs as soon as the file is open, as if its command had been chosen.
+const QString kSimulateSwitch = QStringLiteral("--simulate");
+
 // The system's shell has parted the command line already.
-CommandLineParms parmsOf(const QStringList& arguments) {
+CommandLineParms parmsOf(QStringList arguments) {
+    arguments.removeAll(kSimulateSwitch);
     std::vector<std::string> args;
     for (const QString& argument : arguments.mid(1)) {
         if (args.size() < kMostArguments) args.push_back(argument.toStdString());
@@ -37,5 +42,8 @@ int main(int argc, char** argv) {
     ZephStartUp([](std::string_view) {}, program);
     frmZephMain window(program, host);
     window.start();
+    if (QApplication::arguments().contains(kSimulateSwitch)) {
+        window.findChild<QAction*>("mnuSimulationMode")->trigger();
+    }
     return QApplication::exec();
 }
