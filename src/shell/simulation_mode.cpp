@@ -1,7 +1,5 @@
 #include "shell/simulation_mode.h"
 
-#include <QDebug>
-
 namespace {
 
 void refuseBackwardClock(Host& host) {
@@ -11,17 +9,14 @@ void refuseBackwardClock(Host& host) {
         "The visualizer can not enter simulation mode since Windows is reporting that time is running backwards.  This "
         "is usually caused by not having rebooted the computer in over 24 days.\r\n\r\n"
         "Please save your work and then re-boot your computer.  Some computers when shut down do not actually shut "
-        ""
-        "down but enter sleep mode.  This is not the same as a reboot.",
+        "down "
+        "but enter sleep mode.  This is not the same as a reboot.",
         BoxIcon::Critical);
 }
 
 bool openConnection(Program& program, std::string& ip, std::string& port) {
     const CommunicationsContext context{program.seams.socket, program.seams.lister, program.seams.host,
-                                        program.failures, [](std::string_view line) {
-                                            // No failure, so not for the log, which may show a box.
-                                            qInfo("%.*s", static_cast<int>(line.size()), line.data());
-                                        }};
+                                        program.failures, [&](std::string_view line) { program.failures.note(line); }};
     return ZephSetUpCommunications(context, program.connection, program.adapters, ip, port);
 }
 

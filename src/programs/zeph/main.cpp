@@ -9,19 +9,18 @@
 
 namespace {
 
-constexpr std::size_t kMostArguments = 10;
+constexpr int kMostArguments = 10;
 
 // For demonstrations: the simulation runs as soon as the file is open, as if its command had been chosen.
 const QString kSimulateSwitch = QStringLiteral("--simulate");
 
-// The system's shell has parted the command line already.
 CommandLineParms parmsOf(QStringList arguments) {
+    arguments.removeFirst();
     arguments.removeAll(kSimulateSwitch);
     std::vector<std::string> args;
-    for (const QString& argument : arguments.mid(1)) {
-        if (args.size() < kMostArguments) args.push_back(argument.toStdString());
-    }
-    return ProcessCommandLineParms(std::move(args));
+    for (const QString& argument : arguments)
+        args.push_back(argument.toStdString());
+    return ProcessCommandLineParms(GetCommandLine(commandLineText(args), kMostArguments));
 }
 
 }  // namespace
