@@ -17,6 +17,11 @@ void copyPixels(const std::uint32_t* from, std::uint32_t* to, std::int32_t pixel
     std::memcpy(to, from, static_cast<std::size_t>(pixels) * sizeof(std::uint32_t));
 }
 
+// Pixels of the image's side. The few images stay in the cache, the many units do not.
+std::int32_t sideOf(const BulbItem& item, const FramePlan& plan) noexcept {
+    return 2 * plan.Sprites[static_cast<std::size_t>(item.Sprite)].Mask->Size;
+}
+
 // pixels is a multiple of four.
 void copyFours(const std::uint32_t* from, std::uint32_t* to, std::int32_t pixels) noexcept {
     for (std::int32_t x = 0; x < pixels; x += 4)
@@ -28,7 +33,7 @@ template <typename ForEach>
 void sortIntoBands(const FramePlan& plan, ForEach forEach, std::vector<BulbItem>& sorted,
                    std::vector<std::int32_t>& first) {
     const auto forBands = [&](const BulbItem& item, auto&& visit) {
-        const BandRange bands = bandsOf(item.Place, plan.Units[static_cast<std::size_t>(item.Unit)].Side, plan.Height);
+        const BandRange bands = bandsOf(item.Place, sideOf(item, plan), plan.Height);
         for (std::int32_t band = bands.First; band <= bands.Last; ++band)
             visit(static_cast<std::size_t>(band));
     };
@@ -48,6 +53,25 @@ void sortIntoBands(const FramePlan& plan, ForEach forEach, std::vector<BulbItem>
 }
 
 }  // namespace
+
+RowRange StandardSurface::bandRows(std::size_t band) const noexcept {
+    const auto top = static_cast<std::int32_t>(band) * kBandRows;
+    return {top, std::min(top + kBandRows, plan_.Height)};
+}
+
+inline std::uint64_t StandardSurface::tilesOf(const BulbItem& item) const noexcept {
+    const std::int32_t side = sideOf(item, plan_);
+    const std::int32_t left = std::max(0, std::int32_t{item.Place.X}) >> kTileShift;
+    const std::int32_t right = (std::min(plan_.Width, item.Place.X + side) - 1) >> kTileShift;
+    return (std::uint64_t{2} << right) - (std::uint64_t{1} << left);
+}
+
+// The rows of the image within the band, whole fours of pixels wide.
+inline StandardSurface::Square StandardSurface::squareOf(const BulbItem& item, RowRange rows) const noexcept {
+    const std::int32_t side = sideOf(item, plan_);
+    return {item.Place.X, (side + 3) / 4 * 4, std::max(rows.Top, std::int32_t{item.Place.Y}),
+            std::min(rows.Bottom, item.Place.Y + side)};
+}
 
 void StandardSurface::endFrame() {
     if (!scene_) return;
@@ -276,20 +300,12 @@ void StandardSurface::keepSaved(std::size_t band) {
     saved_.End[band + 1] = saved_.Used;
 }
 
-// The rows of the image within the band, whole fours of pixels wide.
-StandardSurface::Square StandardSurface::squareOf(const BulbItem& item, RowRange rows) const noexcept {
-    const std::int32_t side = plan_.Units[static_cast<std::size_t>(item.Unit)].Side;
-    return {item.Place.X, (side + 3) / 4 * 4, std::max(rows.Top, std::int32_t{item.Place.Y}),
-            std::min(rows.Bottom, item.Place.Y + side)};
-}
-
 // Calls out of the planned order come here: over what the passes before painted.
 void StandardSurface::paintOver() {
     const PixelTarget target{frame_.row(0), frame_.stride()};
     forEachNoted([&](const BulbItem& item) {
         kernels_.blendItems({&item, 1}, alpha_.data(), plan_.Sprites.data(), {0, plan_.Height}, target);
-        const BandRange bands =
-            bandsOf(item.Place, plan_.Units[static_cast<std::size_t>(item.Unit)].Side, plan_.Height);
+        const BandRange bands = bandsOf(item.Place, sideOf(item, plan_), plan_.Height);
         for (std::int32_t b = bands.First; b <= bands.Last; ++b) {
             const auto band = static_cast<std::size_t>(b);
             // One that is Unknown by now was painted in this frame and told then.
@@ -307,18 +323,6 @@ void StandardSurface::fetchItem(const BulbItem& item) const noexcept {
     for (std::int32_t y = first; y < end; ++y) {
         __builtin_prefetch(frame_.row(y) + item.Place.X, 1, 3);
     }
-}
-
-RowRange StandardSurface::bandRows(std::size_t band) const noexcept {
-    const auto top = static_cast<std::int32_t>(band) * kBandRows;
-    return {top, std::min(top + kBandRows, plan_.Height)};
-}
-
-std::uint64_t StandardSurface::tilesOf(const BulbItem& item) const noexcept {
-    const std::int32_t side = plan_.Units[static_cast<std::size_t>(item.Unit)].Side;
-    const std::int32_t left = std::max(0, std::int32_t{item.Place.X}) >> kTileShift;
-    const std::int32_t right = (std::min(plan_.Width, item.Place.X + side) - 1) >> kTileShift;
-    return (std::uint64_t{2} << right) - (std::uint64_t{1} << left);
 }
 
 void StandardSurface::tellBand(std::size_t band) {
