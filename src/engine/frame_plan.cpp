@@ -188,10 +188,6 @@ void sortIntoBands(FramePlan& plan) {
 
 }  // namespace
 
-BandRange bandsOf(BulbPlace place, std::int32_t side, std::int32_t height) noexcept {
-    return {std::max(0, std::int32_t{place.Y}) / kBandRows, (std::min(height, place.Y + side) - 1) / kBandRows};
-}
-
 bool touchesCanvas(std::int64_t x, std::int64_t y, std::int32_t side, std::int32_t width,
                    std::int32_t height) noexcept {
     return x + side > 0 && y + side > 0 && x < width && y < height;

@@ -7,6 +7,7 @@
 #include "engine/fixture_state.h"
 #include "engine/render_table.h"
 
+#include <algorithm>
 #include <cstdint>
 #include <span>
 #include <vector>
@@ -57,7 +58,9 @@ struct BandRange {
     std::int32_t Last = 0;
 };
 // The bands that an image touches, given that it touches the canvas.
-BandRange bandsOf(BulbPlace place, std::int32_t side, std::int32_t height) noexcept;
+inline BandRange bandsOf(BulbPlace place, std::int32_t side, std::int32_t height) noexcept {
+    return {std::max(0, std::int32_t{place.Y}) / kBandRows, (std::min(height, place.Y + side) - 1) / kBandRows};
+}
 
 // A place whose image touches the canvas.
 bool touchesCanvas(std::int64_t x, std::int64_t y, std::int32_t side, std::int32_t width, std::int32_t height) noexcept;

@@ -22,7 +22,7 @@ public:
 const ZephMasks& masks() {
     static const std::unique_ptr<ZephMasks> made = [] {
         auto all = std::make_unique<ZephMasks>();
-        DimmingCurveBytes curve;
+        ZephDimmingCurve curve;
         for (std::size_t i = 0; i < curve.size(); ++i)
             curve[i] = static_cast<std::uint8_t>(i);
         ZephSetUpMasks(
