@@ -33,6 +33,8 @@ struct ColumnRange {
     std::int32_t Right = 0;  // one past the last
 };
 
+// LocalItems paints the same picture as BandItems: bulbs that may touch keep their order, the others go from left to
+// right, so that the pixels under work stay in the first-level cache.
 struct FramePlan {
     std::int32_t Width = 0;  // pixels, the canvas
     std::int32_t Height = 0;
@@ -44,7 +46,8 @@ struct FramePlan {
     std::vector<BulbSprite> Sprites;          // those of groups change from frame to frame, the others are shared
     std::vector<BulbItem> Items;              // by unit
     std::vector<BulbItem> BandItems;          // by band, within it in the order of painting
-    std::vector<std::int32_t> FirstBandItem;  // [band], one more than bands
+    std::vector<BulbItem> LocalItems;         // the same bands, in an order that stays near itself: see below
+    std::vector<std::int32_t> FirstBandItem;  // [band], one more than bands; for both
     std::vector<ColumnRange> BandColumns;     // [band], all that lights can reach
     std::int32_t ListedBulbs = 0;             // bulbs of units that are drawn by lists: ribbons, pixels, strobes
     std::int32_t MaxSide = 0;                 // pixels
