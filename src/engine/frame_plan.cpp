@@ -102,7 +102,7 @@ private:
 
     std::int32_t addUnit(std::int32_t fixture, std::int32_t channel) {
         const ZephFixtureState& state = states_[fixture];
-        PlanUnit unit{.Fixture = fixture, .Channel = channel};
+        PlanUnit unit{.Fixture = fixture};
         unit.FirstSprite = static_cast<std::int32_t>(plan_.SpriteOf.size());
         unit.FirstItem = static_cast<std::int32_t>(plan_.Items.size());
         const std::int32_t location = channel == 0 ? 1 : channel;

@@ -18,7 +18,6 @@ inline constexpr std::int32_t kBandRows = 32;
 // A plain channel or an RGB group. Units are numbered from 1 in the order of painting.
 struct PlanUnit {
     std::int32_t Fixture = 0;
-    std::int32_t Channel = 0;      // 0 = an RGB group
     std::int32_t FirstSprite = 0;  // into SpriteOf: one, or one a colour of a Multi Color channel
     std::int32_t SpriteCount = 0;  // 0 = the fixture's size or shape has no mask: nothing is drawn
     std::int32_t FirstItem = 0;    // into Items: its bulbs, unless they come as lists

@@ -11,7 +11,7 @@ namespace {
 
 constexpr std::int32_t kTileShift = 6;  // columns of 64 pixels tell what of a band has changed
 static_assert(kMaxCanvasPixels >> kTileShift < 63);
-constexpr std::size_t kFetchAhead = 8;  // bulbs
+constexpr std::size_t kFetchAhead = 16;  // bulbs
 
 void copyPixels(const std::uint32_t* from, std::uint32_t* to, std::int32_t pixels) noexcept {
     std::memcpy(to, from, static_cast<std::size_t>(pixels) * sizeof(std::uint32_t));
