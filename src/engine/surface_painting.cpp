@@ -11,7 +11,7 @@ namespace {
 
 constexpr std::int32_t kTileShift = 6;  // columns of 64 pixels tell what of a band has changed
 static_assert(kMaxCanvasPixels >> kTileShift < 63);
-constexpr std::size_t kFetchAhead = 8;  // bulbs
+constexpr std::size_t kFetchAhead = 16;  // bulbs
 
 void copyPixels(const std::uint32_t* from, std::uint32_t* to, std::int32_t pixels) noexcept {
     std::memcpy(to, from, static_cast<std::size_t>(pixels) * sizeof(std::uint32_t));
@@ -159,8 +159,10 @@ bool StandardSurface::denseBandChanged(std::size_t band) const noexcept {
 }
 
 std::span<const BulbItem> StandardSurface::plannedOf(std::size_t band) const noexcept {
+    // Listed bulbs are merged by the order of units, which only BandItems keep.
+    const std::vector<BulbItem>& items = bandListed_.of(band).empty() ? plan_.LocalItems : plan_.BandItems;
     const std::int32_t first = plan_.FirstBandItem[band];
-    return {plan_.BandItems.data() + first, static_cast<std::size_t>(plan_.FirstBandItem[band + 1] - first)};
+    return {items.data() + first, static_cast<std::size_t>(plan_.FirstBandItem[band + 1] - first)};
 }
 
 // Puts the band together in the cache, planned and listed bulbs merged by the order of their units, and streams it out.
