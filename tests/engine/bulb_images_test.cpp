@@ -13,7 +13,7 @@ struct Workshop {
     ZephFixtureBulbs bulbs;
 
     Workshop() {
-        DimmingCurveBytes curve;
+        ZephDimmingCurve curve;
         for (std::size_t i = 0; i < curve.size(); ++i)
             curve[i] = static_cast<std::uint8_t>(i);
         ZephSetUpMasks(
