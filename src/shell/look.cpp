@@ -83,5 +83,9 @@ void applyLook(QApplication& application) {
                               "QStatusBar::item { border: none; }"
                               "QStatusBar QLabel { padding: 2px 8px; }"
                               "QToolBar { border: none; spacing: 4px; padding: 3px 6px; }"
-                              "QMenuBar { padding: 2px 4px; }");
+                              "QMenuBar { padding: 2px 4px; }"
+                              "QGroupBox { background: rgba(0, 0, 0, 28); border: 1px solid #3a3d46;"
+                              " border-radius: 5px; margin-top: 1.5em; padding: 4px 2px 2px 2px; }"
+                              "QGroupBox::title { subcontrol-origin: margin; left: 2px; color: #e8b768; }"
+                              "QGroupBox::title:disabled { color: #7c808c; }");
 }
