@@ -74,6 +74,7 @@ void applyLook(QApplication& application) {
     palette.setColor(QPalette::Highlight, kAccent);
     palette.setColor(QPalette::HighlightedText, QColor(24, 20, 12));
     palette.setColor(QPalette::Link, kAccent);
+    palette.setColor(QPalette::Dark, QColor(23, 24, 29));
     for (const QPalette::ColorRole role : {QPalette::WindowText, QPalette::Text, QPalette::ButtonText}) {
         palette.setColor(QPalette::Disabled, role, faint);
     }
@@ -82,6 +83,5 @@ void applyLook(QApplication& application) {
                               "QStatusBar::item { border: none; }"
                               "QStatusBar QLabel { padding: 2px 8px; }"
                               "QToolBar { border: none; spacing: 4px; padding: 3px 6px; }"
-                              "QScrollArea#picViewport { background: #17181d; border: 1px solid #101114; }"
                               "QMenuBar { padding: 2px 4px; }");
 }

@@ -67,6 +67,7 @@ void frmZephMain::buildCanvas() {
     picViewport_ = new QScrollArea(this);
     picViewport_->setObjectName("picViewport");
     picViewport_->setAlignment(Qt::AlignCenter);
+    picViewport_->setBackgroundRole(QPalette::Dark);
     picViewport_->horizontalScrollBar()->setObjectName("HScroll1");
     picViewport_->verticalScrollBar()->setObjectName("VScroll1");
     picMain_ = new PictureBox;

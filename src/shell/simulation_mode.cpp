@@ -1,6 +1,6 @@
 #include "shell/simulation_mode.h"
 
-#include "editor/background.h"
+#include <QDebug>
 
 namespace {
 
@@ -18,8 +18,10 @@ void refuseBackwardClock(Host& host) {
 
 bool openConnection(Program& program, std::string& ip, std::string& port) {
     const CommunicationsContext context{program.seams.socket, program.seams.lister, program.seams.host,
-                                        program.failures,
-                                        [&](std::string_view line) { program.failures.ZephLogError(line); }};
+                                        program.failures, [](std::string_view line) {
+                                            // No failure, so not for the log, which may show a box.
+                                            qInfo("%.*s", static_cast<int>(line.size()), line.data());
+                                        }};
     return ZephSetUpCommunications(context, program.connection, program.adapters, ip, port);
 }
 
