@@ -18,17 +18,6 @@ public:
     }
 };
 
-// A fresh document has nothing beside it that would follow a reset.
-class NobodyWatching : public DocumentWatcher {
-public:
-    void selectionCleared() override {}
-    void fixtureRemoved(int) override {}
-    void objectListChanged() override {}
-    void canvasChanged() override {}
-    void editSessionReset() override {}
-    void clipboardAndStatusCleared() override {}
-};
-
 bool writeExample(const std::string& folder) {
     if (!paintPicture().save(QString::fromStdString(folder + "/house.png"))) {
         std::fprintf(stderr, "house.png cannot be written to %s\n", folder.c_str());
@@ -42,7 +31,7 @@ bool writeExample(const std::string& folder) {
     const ZephPathService paths(folder);
     MessageHost host(stderr);
     PrintedFailures failures;
-    NobodyWatching watcher;
+    NoWatcher watcher;
     // A fixed date: the example stays the same file until its display changes.
     return ZephSaveVisualizerXML("12/24/2025 6:00:00 PM", {settings, paths, host, failures, watcher}, *display);
 }

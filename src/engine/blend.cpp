@@ -50,40 +50,44 @@ RowRange rowsOf(const BulbSprite& sprite, std::int32_t y, RowRange rows) noexcep
     return {std::max(0, rows.Top - y), std::min(2 * sprite.Mask->Size, rows.Bottom - y)};
 }
 
-void blendReference(const BulbSprite& sprite, std::uint8_t alpha, std::span<const BulbPlace> places, RowRange rows,
-                    const PixelTarget& target) noexcept {
-    for (const BulbPlace& place : places) {
-        const RowRange drawn = rowsOf(sprite, place.Y, rows);
+void blendReference(std::span<const BulbItem> items, const std::uint8_t* alphas, const BulbSprite* sprites,
+                    RowRange rows, const PixelTarget& target) noexcept {
+    for (const BulbItem& item : items) {
+        const BulbSprite& sprite = sprites[item.Sprite];
+        const RowRange drawn = rowsOf(sprite, item.Place.Y, rows);
         for (std::int32_t y = drawn.Top; y < drawn.Bottom; ++y) {
-            const std::ptrdiff_t start = (place.Y + y) * target.Stride + place.X;
+            std::uint32_t* to = target.Origin + (item.Place.Y + y) * target.Stride + item.Place.X;
             for (std::int32_t x = 0; x < 2 * sprite.Mask->Size; ++x) {
-                target.Origin[start + x] =
-                    blendPixelReference(sourcePixel(sprite, x, y), target.Under[start + x], alpha);
+                to[x] = blendPixelReference(sourcePixel(sprite, x, y), to[x], alphas[item.Unit]);
             }
         }
     }
 }
 
-void blendPortable(const BulbSprite& sprite, std::uint8_t alpha, std::span<const BulbPlace> places, RowRange rows,
-                   const PixelTarget& target) noexcept {
+void blendRow(const BulbSprite& sprite, std::int32_t y, std::uint32_t alpha, std::uint32_t* to) noexcept {
     const BulbMask& mask = *sprite.Mask;
-    const std::int32_t side = 2 * mask.Size;
-    for (const BulbPlace& place : places) {
-        const RowRange drawn = rowsOf(sprite, place.Y, rows);
+    const MaskBlocks blocks = mask.Blocks[static_cast<std::size_t>(y)];
+    const std::int32_t end = std::min(8 * blocks.End, 2 * mask.Size);
+    if (mask.Soft) {
+        const std::uint32_t* from = sprite.Pixels + y * mask.Stride;
+        for (std::int32_t x = 8 * blocks.First; x < end; ++x)
+            to[x] = blendSoft(from[x], to[x], alpha);
+    } else {
+        const std::uint32_t* lanes = mask.Lanes.data() + y * mask.Stride;
+        for (std::int32_t x = 8 * blocks.First; x < end; ++x) {
+            if (lanes[x] != 0) to[x] = blendHard(sprite.Color, to[x], alpha);
+        }
+    }
+}
+
+void blendPortable(std::span<const BulbItem> items, const std::uint8_t* alphas, const BulbSprite* sprites,
+                   RowRange rows, const PixelTarget& target) noexcept {
+    for (const BulbItem& item : items) {
+        if (alphas[item.Unit] == 0) continue;
+        const BulbSprite& sprite = sprites[item.Sprite];
+        const RowRange drawn = rowsOf(sprite, item.Place.Y, rows);
         for (std::int32_t y = drawn.Top; y < drawn.Bottom; ++y) {
-            const std::ptrdiff_t start = (place.Y + y) * target.Stride + place.X;
-            const std::uint32_t* under = target.Under + start;
-            std::uint32_t* to = target.Origin + start;
-            if (mask.Soft) {
-                const std::uint32_t* from = sprite.Pixels + y * mask.Stride;
-                for (std::int32_t x = 0; x < side; ++x)
-                    to[x] = blendSoft(from[x], under[x], alpha);
-            } else {
-                const std::uint32_t* lanes = mask.Lanes.data() + y * mask.Stride;
-                for (std::int32_t x = 0; x < side; ++x) {
-                    to[x] = lanes[x] != 0 ? blendHard(sprite.Color, under[x], alpha) : under[x];
-                }
-            }
+            blendRow(sprite, y, alphas[item.Unit], target.Origin + (item.Place.Y + y) * target.Stride + item.Place.X);
         }
     }
 }

@@ -26,13 +26,21 @@ struct BulbPlace {
     std::int16_t Y = 0;
 };
 
+// One bulb to paint.
+struct BulbItem {
+    BulbPlace Place;
+    std::int32_t Unit = 0;    // whose alpha it takes
+    std::int32_t Sprite = 0;  // its image
+    bool operator==(const BulbItem& other) const noexcept {
+        return Place.X == other.Place.X && Place.Y == other.Place.Y && Unit == other.Unit && Sprite == other.Sprite;
+    }
+};
+
 // Pixels that are addressed by canvas coordinates: (x, y) stands at Origin[y * Stride + x]. Origin itself may lie
 // outside the storage.
 struct PixelTarget {
     std::uint32_t* Origin = nullptr;
-    std::ptrdiff_t Stride = 0;             // pixels
-    const std::uint32_t* Under = nullptr;  // what is blended over, addressed alike: Origin, or another picture, of
-                                           // which pixels that no bulb covers may or may not be copied
+    std::ptrdiff_t Stride = 0;  // pixels
 };
 
 struct RowRange {
@@ -45,12 +53,12 @@ enum class BlendForm { Reference, Portable, Avx2 };
 // Kernels read and write back unchanged up to this many pixels right of an image's last column.
 inline constexpr std::int32_t kBlendOverreach = 6;
 
-// The kernels of one form. alpha is 0..255.
+// The kernels of one form.
 struct BlendKernels {
-    // Blends the image at each place in turn, the rows within the range alone. All columns must lie in the storage,
-    // with kBlendOverreach pixels beside them.
-    void (*blendBulbs)(const BulbSprite& sprite, std::uint8_t alpha, std::span<const BulbPlace> places, RowRange rows,
-                       const PixelTarget& target) noexcept;
+    // Blends the items one after the other, the rows within the range alone. alphas: 0..255 by unit; sprites: by
+    // number. All columns of an item must lie in the storage, with kBlendOverreach pixels beside them.
+    void (*blendItems)(std::span<const BulbItem> items, const std::uint8_t* alphas, const BulbSprite* sprites,
+                       RowRange rows, const PixelTarget& target) noexcept;
     // Copies a row of pixels past the caches. Both begin on a multiple of 32 bytes; pixels is a multiple of 16.
     void (*streamRow)(const std::uint32_t* from, std::uint32_t* to, std::int32_t pixels) noexcept;
     // To be called once after streaming, before the pixels are read.

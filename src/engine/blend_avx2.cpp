@@ -23,20 +23,21 @@ ZEPH_AVX2_INLINE __m256i load(const std::uint32_t* from) noexcept {
 ZEPH_AVX2_INLINE void store(std::uint32_t* to, __m256i pixels) noexcept {
     _mm256_storeu_si256(reinterpret_cast<__m256i*>(to), pixels);
 }
-ZEPH_AVX2_INLINE __m256i cutBy255(__m256i words) noexcept {
-    return _mm256_srli_epi16(_mm256_mulhi_epu16(words, _mm256_set1_epi16(static_cast<short>(32897))), 7);
+// Of numbers that are one more than what is to be divided.
+ZEPH_AVX2_INLINE __m256i cutBy255(__m256i wordsPlusOne) noexcept {
+    return _mm256_mulhi_epu16(wordsPlusOne, _mm256_set1_epi16(257));
 }
 
 // What one colour at one alpha adds and keeps.
 struct HardBlend {
-    __m256i add;   // s x alpha + 127, four channels over and over
+    __m256i add;   // s x alpha + 128, four channels over and over
     __m256i keep;  // 255 - alpha
 };
 
 ZEPH_AVX2_INLINE HardBlend hardBlend(std::uint32_t color, std::uint8_t alpha) noexcept {
     const __m256i channels = _mm256_unpacklo_epi8(_mm256_set1_epi32(static_cast<int>(color)), _mm256_setzero_si256());
     const __m256i scaled = _mm256_mullo_epi16(channels, _mm256_set1_epi16(alpha));
-    return {_mm256_add_epi16(scaled, _mm256_set1_epi16(127)), _mm256_set1_epi16(static_cast<short>(255 - alpha))};
+    return {_mm256_add_epi16(scaled, _mm256_set1_epi16(128)), _mm256_set1_epi16(static_cast<short>(255 - alpha))};
 }
 
 // Eight pixels, all as if covered.
@@ -48,87 +49,55 @@ ZEPH_AVX2_INLINE __m256i blendAll(__m256i destination, const HardBlend& blend) n
                                cutBy255(_mm256_add_epi16(_mm256_mullo_epi16(high, blend.keep), blend.add)));
 }
 
-ZEPH_AVX2_INLINE void blendBlock(const std::uint32_t* under, std::uint32_t* to, __m256i lanes,
-                                 const HardBlend& blend) noexcept {
-    const __m256i destination = load(under);
+ZEPH_AVX2_INLINE void blendBlock(std::uint32_t* to, __m256i lanes, const HardBlend& blend) noexcept {
+    const __m256i destination = load(to);
     store(to, _mm256_blendv_epi8(destination, blendAll(destination, blend), lanes));
 }
 
-// Two rows of four pixels, the first of them at start.
-ZEPH_AVX2_INLINE void blendRowPair(const PixelTarget& target, std::ptrdiff_t start, __m256i lanes,
+// Two rows of four pixels.
+ZEPH_AVX2_INLINE void blendRowPair(std::uint32_t* to, std::ptrdiff_t stride, __m256i lanes,
                                    const HardBlend& blend) noexcept {
-    const auto* upper = reinterpret_cast<const __m128i*>(target.Under + start);
-    const auto* lower = reinterpret_cast<const __m128i*>(target.Under + start + target.Stride);
+    auto* upper = reinterpret_cast<__m128i*>(to);
+    auto* lower = reinterpret_cast<__m128i*>(to + stride);
     const __m256i destination =
         _mm256_inserti128_si256(_mm256_castsi128_si256(_mm_loadu_si128(upper)), _mm_loadu_si128(lower), 1);
     const __m256i result = _mm256_blendv_epi8(destination, blendAll(destination, blend), lanes);
-    _mm_storeu_si128(reinterpret_cast<__m128i*>(target.Origin + start), _mm256_castsi256_si128(result));
-    _mm_storeu_si128(reinterpret_cast<__m128i*>(target.Origin + start + target.Stride),
-                     _mm256_extracti128_si256(result, 1));
+    _mm_storeu_si128(upper, _mm256_castsi256_si128(result));
+    _mm_storeu_si128(lower, _mm256_extracti128_si256(result, 1));
 }
 
-ZEPH_AVX2_INLINE bool wholeWithin(const BulbPlace& place, std::int32_t side, RowRange rows) noexcept {
-    return place.Y >= rows.Top && place.Y + side <= rows.Bottom;
-}
-
-ZEPH_AVX2 void blendHardRows(const BulbMask& mask, const HardBlend& blend, const BulbPlace& place, RowRange rows,
-                             const PixelTarget& target) noexcept {
-    const std::int32_t first = std::max(0, rows.Top - place.Y);
-    const std::int32_t end = std::min(2 * mask.Size, rows.Bottom - place.Y);
+// The rows first..end - 1 of the image, whose upper left corner lies at corner.
+ZEPH_AVX2 void blendHardRows(const BulbMask& mask, const HardBlend& blend, std::int32_t first, std::int32_t end,
+                             std::uint32_t* corner, std::ptrdiff_t stride) noexcept {
     const std::uint32_t* lanes = mask.Lanes.data() + first * mask.Stride;
-    std::ptrdiff_t start = (place.Y + first) * target.Stride + place.X;
+    std::uint32_t* to = corner + first * stride;
     for (std::int32_t y = first; y < end; ++y) {
         if (mask.Stride < kBlock) {
             alignas(32) std::uint32_t row[kBlock] = {};
             std::copy_n(lanes, mask.Stride, row);
-            blendBlock(target.Under + start, target.Origin + start, load(row), blend);
+            blendBlock(to, load(row), blend);
         } else {
-            for (std::int32_t x = 0; x < mask.Stride; x += kBlock) {
-                blendBlock(target.Under + start + x, target.Origin + start + x, load(lanes + x), blend);
-            }
+            for (std::int32_t x = 0; x < mask.Stride; x += kBlock)
+                blendBlock(to + x, load(lanes + x), blend);
         }
         lanes += mask.Stride;
-        start += target.Stride;
+        to += stride;
     }
 }
 
-ZEPH_AVX2 void blendHardBulbs(const BulbSprite& sprite, std::uint8_t alpha, std::span<const BulbPlace> places,
-                              RowRange rows, const PixelTarget& target) noexcept {
-    const BulbMask& mask = *sprite.Mask;
-    const std::int32_t side = 2 * mask.Size;
-    const HardBlend blend = hardBlend(sprite.Color, alpha);
-    if (mask.Size == 1) {
-        const __m256i lanes = load(mask.Lanes.data());
-        for (const BulbPlace& place : places) {
-            if (wholeWithin(place, side, rows)) {
-                blendRowPair(target, place.Y * target.Stride + place.X, lanes, blend);
-            } else {
-                blendHardRows(mask, blend, place, rows, target);
-            }
-        }
+ZEPH_AVX2_INLINE void blendHard(const BulbMask& mask, const HardBlend& blend, std::int32_t first, std::int32_t end,
+                                std::uint32_t* corner, std::ptrdiff_t stride) noexcept {
+    if (mask.Size > 2 || first != 0 || end != 2 * mask.Size) {
+        blendHardRows(mask, blend, first, end, corner, stride);
         return;
     }
-    if (mask.Size == 2) {
-        const __m256i upper = load(mask.Lanes.data());
-        const __m256i lower = load(mask.Lanes.data() + kBlock);
-        for (const BulbPlace& place : places) {
-            if (!wholeWithin(place, side, rows)) {
-                blendHardRows(mask, blend, place, rows, target);
-                continue;
-            }
-            const std::ptrdiff_t start = place.Y * target.Stride + place.X;
-            blendRowPair(target, start, upper, blend);
-            blendRowPair(target, start + 2 * target.Stride, lower, blend);
-        }
-        return;
-    }
-    for (const BulbPlace& place : places)
-        blendHardRows(mask, blend, place, rows, target);
+    blendRowPair(corner, stride, load(mask.Lanes.data()), blend);
+    if (mask.Size == 2) blendRowPair(corner + 2 * stride, stride, load(mask.Lanes.data() + kBlock), blend);
 }
 
 // Four pixels of a soft image as sixteen words.
 struct SoftHalf {
-    __m256i add;    // s x alpha + 127
+    __m256i add;    // s x alpha + 128
     __m256i whole;  // 255 - ceiling of sourceAlpha x alpha / 255
     __m256i part;   // what that ceiling is too high by, 0..254
 };
@@ -137,61 +106,65 @@ ZEPH_AVX2_INLINE SoftHalf softHalf(__m256i source, __m256i alpha) noexcept {
     // The alpha word of each pixel in all its four words.
     const __m256i sourceAlpha = _mm256_shufflehi_epi16(_mm256_shufflelo_epi16(source, 0xFF), 0xFF);
     const __m256i product = _mm256_mullo_epi16(sourceAlpha, alpha);
-    const __m256i ceiling = cutBy255(_mm256_add_epi16(product, _mm256_set1_epi16(254)));
+    const __m256i ceiling = cutBy255(_mm256_add_epi16(product, _mm256_set1_epi16(255)));
     const __m256i scaled = _mm256_sub_epi16(_mm256_slli_epi16(ceiling, 8), ceiling);
-    return {_mm256_add_epi16(_mm256_mullo_epi16(source, alpha), _mm256_set1_epi16(127)),
+    return {_mm256_add_epi16(_mm256_mullo_epi16(source, alpha), _mm256_set1_epi16(128)),
             _mm256_sub_epi16(_mm256_set1_epi16(255), ceiling), _mm256_sub_epi16(scaled, product)};
 }
 
 ZEPH_AVX2_INLINE __m256i blendSoftHalf(__m256i destination, const SoftHalf& soft) noexcept {
     const __m256i carried =
-        cutBy255(_mm256_add_epi16(_mm256_mullo_epi16(destination, soft.part), _mm256_set1_epi16(127)));
+        cutBy255(_mm256_add_epi16(_mm256_mullo_epi16(destination, soft.part), _mm256_set1_epi16(128)));
     const __m256i sum = _mm256_add_epi16(soft.add, _mm256_mullo_epi16(destination, soft.whole));
     return cutBy255(_mm256_add_epi16(sum, carried));
 }
 
-ZEPH_AVX2_INLINE void blendSoftBlock(const PixelTarget& target, std::ptrdiff_t start, const SoftHalf& low,
-                                     const SoftHalf& high) noexcept {
+ZEPH_AVX2_INLINE void blendSoftBlock(std::uint32_t* to, const SoftHalf& low, const SoftHalf& high) noexcept {
     const __m256i zero = _mm256_setzero_si256();
-    const __m256i destination = load(target.Under + start);
-    store(target.Origin + start, _mm256_packus_epi16(blendSoftHalf(_mm256_unpacklo_epi8(destination, zero), low),
-                                                     blendSoftHalf(_mm256_unpackhi_epi8(destination, zero), high)));
+    const __m256i destination = load(to);
+    store(to, _mm256_packus_epi16(blendSoftHalf(_mm256_unpacklo_epi8(destination, zero), low),
+                                  blendSoftHalf(_mm256_unpackhi_epi8(destination, zero), high)));
 }
 
 // A flood's rows are the same from above and from below, so what a row of the image comes to serves two rows of pixels.
-ZEPH_AVX2 void blendSoftBulbs(const BulbSprite& sprite, std::uint8_t alpha, std::span<const BulbPlace> places,
-                              RowRange rows, const PixelTarget& target) noexcept {
+ZEPH_AVX2 void blendSoft(const BulbSprite& sprite, std::uint8_t alpha, std::int32_t first, std::int32_t end,
+                         std::uint32_t* corner, std::ptrdiff_t stride) noexcept {
     const BulbMask& mask = *sprite.Mask;
     const __m256i zero = _mm256_setzero_si256();
     const __m256i alphas = _mm256_set1_epi16(alpha);
-    for (const BulbPlace& place : places) {
-        const std::ptrdiff_t corner = place.Y * target.Stride + place.X;
-        for (std::int32_t y = 0; y < mask.Size; ++y) {
-            const std::int32_t mirror = 2 * mask.Size - 1 - y;
-            const bool drawUpper = place.Y + y >= rows.Top && place.Y + y < rows.Bottom;
-            const bool drawLower = place.Y + mirror >= rows.Top && place.Y + mirror < rows.Bottom;
-            if (!drawUpper && !drawLower) continue;
-            const std::uint32_t* from = sprite.Pixels + y * mask.Stride;
-            const std::ptrdiff_t upper = corner + y * target.Stride;
-            const std::ptrdiff_t lower = corner + mirror * target.Stride;
-            const MaskBlocks blocks = mask.Blocks[static_cast<std::size_t>(y)];
-            for (std::int32_t x = kBlock * blocks.First; x < kBlock * blocks.End; x += kBlock) {
-                const __m256i source = load(from + x);
-                const SoftHalf low = softHalf(_mm256_unpacklo_epi8(source, zero), alphas);
-                const SoftHalf high = softHalf(_mm256_unpackhi_epi8(source, zero), alphas);
-                if (drawUpper) blendSoftBlock(target, upper + x, low, high);
-                if (drawLower) blendSoftBlock(target, lower + x, low, high);
-            }
+    for (std::int32_t y = 0; y < mask.Size; ++y) {
+        const std::int32_t mirror = 2 * mask.Size - 1 - y;
+        const bool drawUpper = y >= first && y < end;
+        const bool drawLower = mirror >= first && mirror < end;
+        if (!drawUpper && !drawLower) continue;
+        const std::uint32_t* from = sprite.Pixels + y * mask.Stride;
+        std::uint32_t* upper = corner + y * stride;
+        std::uint32_t* lower = corner + mirror * stride;
+        const MaskBlocks blocks = mask.Blocks[static_cast<std::size_t>(y)];
+        for (std::int32_t x = kBlock * blocks.First; x < kBlock * blocks.End; x += kBlock) {
+            const __m256i source = load(from + x);
+            const SoftHalf low = softHalf(_mm256_unpacklo_epi8(source, zero), alphas);
+            const SoftHalf high = softHalf(_mm256_unpackhi_epi8(source, zero), alphas);
+            if (drawUpper) blendSoftBlock(upper + x, low, high);
+            if (drawLower) blendSoftBlock(lower + x, low, high);
         }
     }
 }
 
-ZEPH_AVX2 void blendBulbs(const BulbSprite& sprite, std::uint8_t alpha, std::span<const BulbPlace> places,
+ZEPH_AVX2 void blendItems(std::span<const BulbItem> items, const std::uint8_t* alphas, const BulbSprite* sprites,
                           RowRange rows, const PixelTarget& target) noexcept {
-    if (sprite.Mask->Soft) {
-        blendSoftBulbs(sprite, alpha, places, rows, target);
-    } else {
-        blendHardBulbs(sprite, alpha, places, rows, target);
+    for (const BulbItem& item : items) {
+        const std::uint8_t alpha = alphas[item.Unit];
+        if (alpha == 0) continue;
+        const BulbSprite& sprite = sprites[item.Sprite];
+        const std::int32_t first = std::max(0, rows.Top - item.Place.Y);
+        const std::int32_t end = std::min(2 * sprite.Mask->Size, rows.Bottom - item.Place.Y);
+        std::uint32_t* corner = target.Origin + item.Place.Y * target.Stride + item.Place.X;
+        if (sprite.Mask->Soft) {
+            blendSoft(sprite, alpha, first, end, corner, target.Stride);
+        } else {
+            blendHard(*sprite.Mask, hardBlend(sprite.Color, alpha), first, end, corner, target.Stride);
+        }
     }
 }
 
@@ -210,7 +183,7 @@ void endStreaming() noexcept {
 
 }  // namespace
 
-const BlendKernels kAvx2Kernels{blendBulbs, streamRow, endStreaming};
+const BlendKernels kAvx2Kernels{blendItems, streamRow, endStreaming};
 
 bool avx2Available() noexcept {
     return __builtin_cpu_supports("avx2") != 0;

@@ -18,27 +18,13 @@ inline constexpr std::int32_t kBandRows = 32;
 struct PlanUnit {
     std::int32_t Fixture = 0;
     std::int32_t Channel = 0;      // 0 = an RGB group
-    std::int32_t FirstSprite = 0;  // into Sprites: one, or one a colour of a Multi Color channel
+    std::int32_t FirstSprite = 0;  // into SpriteOf: one, or one a colour of a Multi Color channel
     std::int32_t SpriteCount = 0;  // 0 = the fixture's size or shape has no mask: nothing is drawn
-    std::int32_t FirstRun = 0;     // into Runs
-    std::int32_t RunCount = 0;
+    std::int32_t FirstItem = 0;    // into Items: its bulbs, unless they come as lists
+    std::int32_t ItemCount = 0;
     std::int32_t FirstBulb = 0;  // into BulbPool, as in ZephBulbLocations
     std::int32_t BulbCount = 0;
-    std::int32_t VisibleBulbs = 0;  // that touch the canvas
-    std::int32_t Side = 0;          // pixels, of a bulb's image
-    std::int32_t FirstTile = 0;     // into Tiles: where its runs lie
-    std::int32_t TileCount = 0;
-    bool Alone = false;  // whole on the canvas, and no bulb touches another's pixels, its own included
-};
-
-// Tiles of 64 x 64 pixels tell what of the frame has changed.
-inline constexpr std::int32_t kTileShift = 6;
-inline constexpr std::int32_t kMaxTileRows = (kMaxCanvasPixels >> kTileShift) + 1;
-static_assert(kMaxTileRows < 64);  // tiles of a row are bits of one number
-
-struct TileRow {
-    std::int32_t Row = 0;
-    std::uint64_t Bits = 0;  // bit of each tile of the row
+    std::int32_t Side = 0;  // pixels, of a bulb's image
 };
 
 struct ColumnRange {
@@ -46,35 +32,18 @@ struct ColumnRange {
     std::int32_t Right = 0;  // one past the last
 };
 
-// A bulb's image at a place.
-struct BulbSquare {
-    BulbPlace Place;
-    std::int32_t Side = 0;  // pixels
-};
-
-// Bulbs of one unit and one sprite, painted one after the other.
-struct PlanRun {
-    std::int32_t Unit = 0;
-    std::int32_t Sprite = 0;
-    std::int32_t FirstPlace = 0;
-    std::int32_t PlaceCount = 0;
-    bool WholeOnCanvas = false;  // no bulb of the run is cut by the canvas edge
-};
-
 struct FramePlan {
     std::int32_t Width = 0;  // pixels, the canvas
     std::int32_t Height = 0;
     std::int32_t BandCount = 0;
-    std::vector<PlanUnit> Units;              // [0] not used
+    std::vector<PlanUnit> Units;              // [0] not used, draws nothing
     std::vector<std::int32_t> UnitOfChannel;  // [fixture x (kMaxChannels + 1) + channel], 0 = none
     std::vector<std::int32_t> UnitOfGroup;    // [RGBIndex], 0 = none
-    std::vector<BulbSprite> Sprites;          // those of groups change from frame to frame
-    std::vector<BulbPlace> Places;            // of Runs, in order
-    std::vector<PlanRun> Runs;                // by unit
-    std::vector<BulbPlace> BandPlaces;        // of BandRuns, in order
-    std::vector<PlanRun> BandRuns;            // by band, within it in the order of painting
-    std::vector<std::int32_t> FirstBandRun;   // [band], one more than bands
-    std::vector<TileRow> Tiles;               // by unit
+    std::vector<std::int32_t> SpriteOf;       // into Sprites, by unit
+    std::vector<BulbSprite> Sprites;          // those of groups change from frame to frame, the others are shared
+    std::vector<BulbItem> Items;              // by unit
+    std::vector<BulbItem> BandItems;          // by band, within it in the order of painting
+    std::vector<std::int32_t> FirstBandItem;  // [band], one more than bands
     std::vector<ColumnRange> BandColumns;     // [band], all that lights can reach
     std::int32_t ListedBulbs = 0;             // bulbs of units that are drawn by lists: ribbons, pixels, strobes
     std::int32_t MaxSide = 0;                 // pixels
@@ -83,16 +52,12 @@ struct FramePlan {
     std::int32_t MaxFloodSize = 0;  // of the flood groups
 };
 
-// Sets the tiles that the square touches, in rows of tiles from the top. The square touches the canvas.
-void markTiles(const BulbSquare& square, std::int32_t width, std::int32_t height,
-               std::span<std::uint64_t> tiles) noexcept;
-
 struct BandRange {
     std::int32_t First = 0;
     std::int32_t Last = 0;
 };
-// The bands that the square touches. It touches the canvas.
-BandRange bandsOf(const BulbSquare& square, std::int32_t height) noexcept;
+// The bands that an image touches, given that it touches the canvas.
+BandRange bandsOf(BulbPlace place, std::int32_t side, std::int32_t height) noexcept;
 
 // A place whose image touches the canvas.
 bool touchesCanvas(std::int64_t x, std::int64_t y, std::int32_t side, std::int32_t width, std::int32_t height) noexcept;

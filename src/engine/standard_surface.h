@@ -5,6 +5,7 @@
 
 #include "engine/frame_plan.h"
 #include "engine/light_surface.h"
+#include "engine/pixel_store.h"
 #include "engine/rgb_bulbs.h"
 #include "util/failure.h"
 
@@ -25,33 +26,6 @@ struct SurfaceScene {
     const ZephMasks& Masks;
     const ZephStaticBulbs& Bulbs;
     const QImage& Background;  // the canvas, 1..2500 pixels either way; copied
-};
-
-inline constexpr std::int32_t kBandMargin = 128;    // pixels beside a band: the largest image hangs out no farther
-inline constexpr std::int32_t kBandMarginRows = 4;  // small bulbs are painted whole, over the band's edge
-
-inline constexpr std::int32_t kCacheLinePixels = 16;
-
-constexpr std::int32_t wholeCacheLines(std::int32_t pixels) noexcept {
-    return (pixels + kCacheLinePixels - 1) / kCacheLinePixels * kCacheLinePixels;
-}
-
-// Rows of pixels that begin on whole cache lines, with room beside them for the kernels' overreach.
-class PixelStore {
-public:
-    PixelStore() = default;
-    PixelStore(PixelStore&&) = default;
-    PixelStore& operator=(PixelStore&&) = default;
-
-    void resize(std::int32_t width, std::int32_t height);  // fills with opaque black
-    std::uint32_t* row(std::int32_t y) noexcept { return first_ + y * stride_; }
-    const std::uint32_t* row(std::int32_t y) const noexcept { return first_ + y * stride_; }
-    std::int32_t stride() const noexcept { return stride_; }  // pixels, a multiple of kCacheLinePixels
-
-private:
-    std::vector<std::uint32_t> pixels_;
-    std::uint32_t* first_ = nullptr;
-    std::int32_t stride_ = 0;
 };
 
 class StandardSurface : public LightSurface {
@@ -84,75 +58,80 @@ public:
     const ZephRGBBulbCache& bulbCache() const noexcept { return cache_; }
 
 private:
-    struct NotedUnit {  // one call, in the order of calls
-        std::int32_t Unit;
-        std::int32_t FirstListed;  // into listed_; -1 = the unit's own runs
-        std::int32_t ListedCount;
-    };
-    struct ListedBulb {
-        BulbPlace Place;
-        std::int32_t Sprite;
-        std::int32_t Unit;
-        std::uint8_t Alpha;
-    };
+    static constexpr std::int32_t kBandMarginRows = 4;  // bulbs of size 2 are painted whole, over the band's edge
+
     enum class BandLight : std::uint8_t {
         None,    // shows the background
-        Runs,    // shows the runs of lastAlpha_: it stays while those do
+        Whole,   // shows the units of lastWhole_: it stays while those do
+        Listed,  // shows the squares of lastListed_
         Unknown  // shows other lights
     };
+    // Bulbs by band, within a band in the order of painting.
+    struct BandLists {
+        std::vector<BulbItem> Items;
+        std::vector<std::int32_t> First;  // [band], one more than bands
 
-    void noteUnit(std::int32_t unit);
-    void noteRuns(std::int32_t unit, std::uint8_t alpha);
-    void listBulb(std::int32_t unit, std::int32_t bulb0, std::uint8_t alpha);
-    void updateSprite(const PlanUnit& planned, std::int32_t color, ZephRGBData& group);
+        std::span<const BulbItem> of(std::size_t band) const noexcept {
+            return {Items.data() + First[band], static_cast<std::size_t>(First[band + 1] - First[band])};
+        }
+    };
+
+    void noteUnit(std::int32_t unit, std::uint8_t alpha);
+    void noteWhole(std::int32_t unit);
+    void listBulb(std::int32_t unit, std::int32_t bulb0);
+    void updateSprite(std::int32_t unit, std::int32_t color, ZephRGBData& group);
+
     void paintNoted();
     bool worthBands() const noexcept;
+    template <typename Visit>
+    void forEachNoted(Visit visit) const;
+    void paintDense();
+    bool denseBandChanged(std::size_t band) const noexcept;
+    void paintBandDense(std::size_t band);
+    void paintThin();
+    void paintBandThin(std::size_t band);
+    void paintOver();
 
-    void paintBands();
-    void sortListedIntoBands();
-    bool bandChanged(std::size_t band) const noexcept;
-    bool paintBand(std::size_t band);
-
-    void paintSquares();
-    void paintSquare(std::int32_t sprite, std::uint8_t alpha, const BulbSquare& square);
-    void noteLit(const BulbSquare& square);
-    void restoreLit();
-    void restoreSquare(const BulbSquare& square);
-    void restoreBand(std::size_t band);
-    QRect bandRect(std::size_t band) const;
-    void markUnitTiles(const PlanUnit& unit);
-    void collectTiles();
+    void restoreItem(const BulbItem& item, RowRange rows);
+    void fetchItem(const BulbItem& item) const noexcept;
+    void fetchRow(std::size_t band, std::int32_t y) const noexcept;
+    std::span<const BulbItem> plannedOf(std::size_t band) const noexcept;
+    RowRange bandRows(std::size_t band) const noexcept;
+    std::uint64_t tilesOf(const BulbItem& item) const noexcept;
+    void tellBand(std::size_t band);
+    void tellTiles(std::size_t band, std::uint64_t tiles);
 
     const BlendKernels& kernels_;
     std::optional<SurfaceScene> scene_;
     FramePlan plan_;
+    std::int64_t reachedPixels_ = 0;  // that lights can reach
     ZephRGBBulbCache cache_;
     RGBBulbPool pool_;
 
     PixelStore frame_;
     PixelStore background_;
-    PixelStore band_;
+    PixelStore band_;  // one band under way, with kBandMarginRows above and below
     QImage image_;
 
     // The frame under way. A later pass comes about only when calls leave the planned order or lists overflow.
-    std::vector<std::uint8_t> alpha_;          // [unit], 0 = its runs are not painted
+    std::vector<std::uint8_t> alpha_;          // [unit], 0 = not drawn
+    std::vector<std::uint8_t> whole_;          // [unit], alpha_ where its planned items are drawn, else 0
     std::vector<std::uint8_t> spriteChanged_;  // [unit], since the last frame
     bool anySpriteChanged_ = false;
-    std::vector<NotedUnit> noted_;
-    std::vector<ListedBulb> listed_;
+    std::vector<std::int32_t> notedWhole_;  // units, in the order of calls
+    std::vector<BulbItem> listed_;          // bulbs that came as lists, in the order of calls
+    std::int32_t lastUnit_ = 0;
     std::int64_t litBulbs_ = 0;
     std::int64_t litPixels_ = 0;
     std::int32_t passes_ = 0;
-    std::vector<std::int32_t> bandListed_;       // into listed_, by band
-    std::vector<std::int32_t> firstBandListed_;  // [band], one more than bands
-    std::vector<std::uint64_t> tiles_;           // [row of tiles], a bit for each that changed
+    BandLists bandListed_;
     std::vector<QRect> changed_;
 
     // What the frame before left on the picture.
     std::vector<std::uint8_t> lastAlpha_;
+    std::vector<std::uint8_t> lastWhole_;
+    BandLists lastListed_;
     std::vector<BandLight> bandLight_;
-    std::vector<BulbSquare> lit_;
-    std::vector<std::int32_t> litUnits_;  // whose runs were painted square by square, in the first pass
-    bool wholeChanged_ = true;            // the frame under it was replaced
-    bool lastRepeats_ = false;            // lastAlpha_ and the images tell all of it
+    bool lastRepeats_ = false;   // lastWhole_ and the images tell all of it
+    bool wholeChanged_ = false;  // the background was replaced
 };

@@ -1,5 +1,6 @@
-// How the standard surface paints what was noted: by bands of rows, each put together in the cache and streamed out,
-// or square by square on the frame itself.
+// How the standard surface paints what was noted. A densely lit frame: each band of rows is put together in the cache,
+// from the background up, and streamed out. A thinly lit one: the squares of its bulbs are sorted by bands, and in each
+// band those of the frame before are restored and the new ones blended where they lie.
 #include "engine/standard_surface.h"
 
 #include <algorithm>
@@ -8,8 +9,36 @@
 
 namespace {
 
+constexpr std::int32_t kTileShift = 6;  // columns of 64 pixels tell what of a band has changed
+static_assert(kMaxCanvasPixels >> kTileShift < 63);
+constexpr std::size_t kFetchAhead = 8;  // bulbs
+
 void copyPixels(const std::uint32_t* from, std::uint32_t* to, std::int32_t pixels) noexcept {
     std::memcpy(to, from, static_cast<std::size_t>(pixels) * sizeof(std::uint32_t));
+}
+
+// A counting sort: forEach visits the items in the order of painting, twice, and that order stays within a band.
+template <typename ForEach>
+void sortIntoBands(const FramePlan& plan, ForEach forEach, std::vector<BulbItem>& sorted,
+                   std::vector<std::int32_t>& first) {
+    const auto forBands = [&](const BulbItem& item, auto&& visit) {
+        const BandRange bands = bandsOf(item.Place, plan.Units[static_cast<std::size_t>(item.Unit)].Side, plan.Height);
+        for (std::int32_t band = bands.First; band <= bands.Last; ++band)
+            visit(static_cast<std::size_t>(band));
+    };
+    std::fill(first.begin(), first.end(), 0);
+    // Counted one place on, so that after the second round each band's number is where its items begin.
+    const std::size_t bands = first.size() - 1;
+    forEach([&](const BulbItem& item) {
+        forBands(item, [&](std::size_t band) {
+            if (band + 2 <= bands) ++first[band + 2];
+        });
+    });
+    for (std::size_t band = 2; band <= bands; ++band)
+        first[band] += first[band - 1];
+    forEach([&](const BulbItem& item) {
+        forBands(item, [&](std::size_t band) { sorted[static_cast<std::size_t>(first[band + 1]++)] = item; });
+    });
 }
 
 }  // namespace
@@ -17,296 +46,259 @@ void copyPixels(const std::uint32_t* from, std::uint32_t* to, std::int32_t pixel
 void StandardSurface::endFrame() {
     if (!scene_) return;
     paintNoted();
-    collectTiles();
+    if (passes_ > 1) lastRepeats_ = false;
     if (wholeChanged_) changed_.assign(1, image_.rect());
     wholeChanged_ = false;
-    if (passes_ > 1) {
-        std::fill(lastAlpha_.begin(), lastAlpha_.end(), std::uint8_t{0});
-        std::replace(bandLight_.begin(), bandLight_.end(), BandLight::Runs, BandLight::Unknown);
-        lastRepeats_ = false;
-    }
     if (anySpriteChanged_) std::fill(spriteChanged_.begin(), spriteChanged_.end(), std::uint8_t{0});
     anySpriteChanged_ = false;
 }
 
 // Paints what was noted since the frame began, or since the pass before.
 void StandardSurface::paintNoted() {
-    const bool repeats = listed_.empty();
     if (passes_ > 0) {
-        paintSquares();
-    } else if (!repeats || !lastRepeats_ || anySpriteChanged_ || alpha_ != lastAlpha_) {
-        if (worthBands()) {
-            paintBands();
-        } else {
-            restoreLit();
-            paintSquares();
+        paintOver();
+    } else {
+        const bool repeats = listed_.empty();
+        if (!repeats || !lastRepeats_ || anySpriteChanged_ || whole_ != lastWhole_) {
+            if (worthBands()) {
+                paintDense();
+            } else {
+                paintThin();
+            }
         }
         lastRepeats_ = repeats;
+        alpha_.swap(lastAlpha_);
+        whole_.swap(lastWhole_);
     }
     ++passes_;
-    noted_.clear();
+    std::fill(alpha_.begin(), alpha_.end(), std::uint8_t{0});
+    std::fill(whole_.begin(), whole_.end(), std::uint8_t{0});
+    notedWhole_.clear();
     listed_.clear();
+    lastUnit_ = 0;
     litBulbs_ = 0;
     litPixels_ = 0;
-    alpha_.swap(lastAlpha_);
-    std::fill(alpha_.begin(), alpha_.end(), std::uint8_t{0});
 }
 
-// A band costs a copy of its pixels whatever is lit on it, a square the cache misses of its rows. Measured: the two
-// meet where about a seventh of the canvas is under small bulbs, later for large ones, whose rows are long.
+// Dense painting costs a copy of all that lights can reach, thin painting the cache misses of every bulb. Measured on
+// scattered bulbs of size 2, the two meet where a sixth of the canvas lies under bulbs; large bulbs, whose rows are
+// long, lie thin for longer.
 bool StandardSurface::worthBands() const noexcept {
-    constexpr std::int64_t kBulbCost = 48;  // in pixels
-    const std::int64_t canvas = std::int64_t{plan_.Width} * plan_.Height;
-    return litPixels_ + kBulbCost * litBulbs_ > canvas / 2;
+    constexpr std::int64_t kBulbCost = 58;  // in pixels painted thin
+    return 4 * (litPixels_ + kBulbCost * litBulbs_) > 3 * reachedPixels_;
 }
 
-void StandardSurface::paintBands() {
-    for (const BulbSquare& square : lit_) {
-        const BandRange bands = bandsOf(square, plan_.Height);
-        for (std::int32_t b = bands.First; b <= bands.Last; ++b) {
-            bandLight_[static_cast<std::size_t>(b)] = BandLight::Unknown;
+// visit(item) for all that was noted, in the order of painting.
+template <typename Visit>
+void StandardSurface::forEachNoted(Visit visit) const {
+    std::size_t listed = 0;
+    for (const std::int32_t unit : notedWhole_) {
+        for (; listed < listed_.size() && listed_[listed].Unit < unit; ++listed)
+            visit(listed_[listed]);
+        const PlanUnit& planned = plan_.Units[static_cast<std::size_t>(unit)];
+        for (std::int32_t i = 0; i < planned.ItemCount; ++i) {
+            visit(plan_.Items[static_cast<std::size_t>(planned.FirstItem + i)]);
         }
     }
-    for (const std::int32_t number : litUnits_) {
-        const PlanUnit& unit = plan_.Units[static_cast<std::size_t>(number)];
-        for (std::int32_t t = 0; t < unit.TileCount; ++t) {
-            static_assert(1 << kTileShift == 2 * kBandRows);
-            const auto band =
-                2 * static_cast<std::size_t>(plan_.Tiles[static_cast<std::size_t>(unit.FirstTile + t)].Row);
-            bandLight_[band] = BandLight::Unknown;
-            if (band + 1 < bandLight_.size()) bandLight_[band + 1] = BandLight::Unknown;
-        }
-    }
-    litUnits_.clear();
-    lit_.clear();
-    sortListedIntoBands();
+    for (; listed < listed_.size(); ++listed)
+        visit(listed_[listed]);
+}
+
+void StandardSurface::paintDense() {
+    const auto forEachListed = [&](auto&& visit) { std::for_each(listed_.begin(), listed_.end(), visit); };
+    sortIntoBands(plan_, forEachListed, bandListed_.Items, bandListed_.First);
     for (std::size_t band = 0; band < bandLight_.size(); ++band) {
-        if (!bandChanged(band)) continue;
-        const bool lists = firstBandListed_[band] != firstBandListed_[band + 1];
-        const bool lit = paintBand(band);
-        bandLight_[band] = lists ? BandLight::Unknown : lit ? BandLight::Runs : BandLight::None;
-        changed_.push_back(bandRect(band));
+        if (!denseBandChanged(band)) continue;
+        paintBandDense(band);
+        bandLight_[band] = bandListed_.of(band).empty() ? BandLight::Whole : BandLight::Unknown;
+        tellBand(band);
     }
     kernels_.endStreaming();
 }
 
-// A counting sort, so that within a band the order of the calls stays.
-void StandardSurface::sortListedIntoBands() {
-    std::fill(firstBandListed_.begin(), firstBandListed_.end(), 0);
-    const auto forBands = [&](const ListedBulb& bulb, auto&& visit) {
-        const std::int32_t side = plan_.Units[static_cast<std::size_t>(bulb.Unit)].Side;
-        const std::int32_t first = std::max(0, std::int32_t{bulb.Place.Y}) / kBandRows;
-        const std::int32_t last = (std::min(plan_.Height, bulb.Place.Y + side) - 1) / kBandRows;
-        for (std::int32_t band = first; band <= last; ++band)
-            visit(static_cast<std::size_t>(band));
+bool StandardSurface::denseBandChanged(std::size_t band) const noexcept {
+    if (bandLight_[band] == BandLight::Listed || bandLight_[band] == BandLight::Unknown ||
+        !bandListed_.of(band).empty()) {
+        return true;
+    }
+    const std::span<const BulbItem> items = plannedOf(band);
+    return std::any_of(items.begin(), items.end(), [&](const BulbItem& item) {
+        const auto unit = static_cast<std::size_t>(item.Unit);
+        return whole_[unit] != lastWhole_[unit] || (spriteChanged_[unit] != 0 && whole_[unit] != 0);
+    });
+}
+
+std::span<const BulbItem> StandardSurface::plannedOf(std::size_t band) const noexcept {
+    const std::int32_t first = plan_.FirstBandItem[band];
+    return {plan_.BandItems.data() + first, static_cast<std::size_t>(plan_.FirstBandItem[band + 1] - first)};
+}
+
+// Puts the band together in the cache, planned and listed bulbs merged by the order of their units, and streams it out.
+void StandardSurface::paintBandDense(std::size_t band) {
+    const RowRange rows = bandRows(band);
+    const ColumnRange columns = plan_.BandColumns[band];
+    const std::int32_t left = columns.Left / kCacheLinePixels * kCacheLinePixels;
+    const std::int32_t pixels = wholeCacheLines(columns.Right - left);
+    std::uint32_t* origin = band_.row(kBandMarginRows) - std::ptrdiff_t{rows.Top} * band_.stride();
+    const PixelTarget target{origin, band_.stride()};
+    for (std::int32_t y = rows.Top; y < rows.Bottom; ++y) {
+        copyPixels(background_.row(y) + left, origin + y * target.Stride + left, pixels);
+    }
+
+    const RowRange painted{rows.Top - kBandMarginRows, rows.Bottom + kBandMarginRows};
+    const std::span<const BulbItem> items = plannedOf(band);
+    const std::span<const BulbItem> listed = bandListed_.of(band);
+    std::size_t item = 0;
+    std::size_t list = 0;
+    const auto paintItemsUpTo = [&](std::size_t end) {
+        kernels_.blendItems(items.subspan(item, end - item), whole_.data(), plan_.Sprites.data(), painted, target);
+        item = end;
     };
-    for (const ListedBulb& bulb : listed_) {
-        forBands(bulb, [&](std::size_t band) { ++firstBandListed_[band]; });
-    }
-    std::int32_t before = 0;
-    for (std::int32_t& first : firstBandListed_) {
-        before += first;
-        first = before;  // for now the end of each band's part
-    }
-    for (std::size_t i = listed_.size(); i-- > 0;) {
-        forBands(listed_[i], [&](std::size_t band) {
-            bandListed_[static_cast<std::size_t>(--firstBandListed_[band])] = static_cast<std::int32_t>(i);
-        });
-    }
-}
-
-bool StandardSurface::bandChanged(std::size_t band) const noexcept {
-    if (bandLight_[band] == BandLight::Unknown || firstBandListed_[band] != firstBandListed_[band + 1]) return true;
-    const auto first = static_cast<std::size_t>(plan_.FirstBandRun[band]);
-    const auto end = static_cast<std::size_t>(plan_.FirstBandRun[band + 1]);
-    for (std::size_t r = first; r < end; ++r) {
-        const auto unit = static_cast<std::size_t>(plan_.BandRuns[r].Unit);
-        if (alpha_[unit] != lastAlpha_[unit] || (spriteChanged_[unit] != 0 && alpha_[unit] != 0)) return true;
-    }
-    return false;
-}
-
-// Puts the band together in the cache, runs and listed bulbs merged by the order of their units, and streams it out.
-// Gives whether anything is lit on it.
-bool StandardSurface::paintBand(std::size_t band) {
-    const auto top = static_cast<std::int32_t>(band) * kBandRows;
-    const std::int32_t rows = std::min(kBandRows, plan_.Height - top);
-    const std::int32_t left = plan_.BandColumns[band].Left / kCacheLinePixels * kCacheLinePixels;
-    const std::int32_t pixels = wholeCacheLines(plan_.BandColumns[band].Right - left);
-    for (std::int32_t y = 0; y < rows; ++y) {
-        copyPixels(background_.row(top + y) + left, band_.row(kBandMarginRows + y) + kBandMargin + left, pixels);
-    }
-
-    std::uint32_t* origin = band_.row(kBandMarginRows) + kBandMargin - std::ptrdiff_t{top} * band_.stride();
-    const PixelTarget target{origin, band_.stride(), origin};
-    const RowRange range{top - kBandMarginRows, top + rows + kBandMarginRows};
-    bool lit = false;
-    auto listed = static_cast<std::size_t>(firstBandListed_[band]);
-    const auto listedEnd = static_cast<std::size_t>(firstBandListed_[band + 1]);
-    const auto paintListedBefore = [&](std::int32_t unit) {
-        for (; listed < listedEnd; ++listed) {
-            const ListedBulb& bulb = listed_[static_cast<std::size_t>(bandListed_[listed])];
-            if (bulb.Unit >= unit) return;
-            kernels_.blendBulbs(plan_.Sprites[static_cast<std::size_t>(bulb.Sprite)], bulb.Alpha, {&bulb.Place, 1},
-                                range, target);
-            lit = true;
+    // The next band's background is fetched row by row meanwhile: blending leaves the memory idle.
+    for (std::int32_t part = 1; part <= kBandRows; ++part) {
+        if (band + 1 < bandLight_.size()) fetchRow(band + 1, rows.Bottom + part - 1);
+        const std::size_t end = items.size() * static_cast<std::size_t>(part) / kBandRows;
+        while (list < listed.size() && end > 0 && listed[list].Unit < items[end - 1].Unit) {
+            const std::int32_t unit = listed[list].Unit;
+            const auto later = std::find_if(items.begin() + static_cast<std::ptrdiff_t>(item), items.end(),
+                                            [&](const BulbItem& other) { return other.Unit > unit; });
+            paintItemsUpTo(static_cast<std::size_t>(later - items.begin()));
+            const std::int32_t before = items[item].Unit;
+            const std::size_t first = list;
+            while (list < listed.size() && listed[list].Unit < before)
+                ++list;
+            kernels_.blendItems(listed.subspan(first, list - first), alpha_.data(), plan_.Sprites.data(), painted,
+                                target);
         }
-    };
-    const auto end = static_cast<std::size_t>(plan_.FirstBandRun[band + 1]);
-    for (auto r = static_cast<std::size_t>(plan_.FirstBandRun[band]); r < end; ++r) {
-        const PlanRun& run = plan_.BandRuns[r];
-        const std::uint8_t alpha = alpha_[static_cast<std::size_t>(run.Unit)];
-        if (alpha == 0) continue;
-        paintListedBefore(run.Unit);
-        kernels_.blendBulbs(plan_.Sprites[static_cast<std::size_t>(run.Sprite)], alpha,
-                            {plan_.BandPlaces.data() + run.FirstPlace, static_cast<std::size_t>(run.PlaceCount)}, range,
-                            target);
-        lit = true;
+        if (item < end) paintItemsUpTo(end);
     }
-    paintListedBefore(static_cast<std::int32_t>(plan_.Units.size()));
+    kernels_.blendItems(listed.subspan(list), alpha_.data(), plan_.Sprites.data(), painted, target);
 
-    for (std::int32_t y = 0; y < rows; ++y) {
-        kernels_.streamRow(band_.row(kBandMarginRows + y) + kBandMargin + left, frame_.row(top + y) + left, pixels);
+    for (std::int32_t y = rows.Top; y < rows.Bottom; ++y) {
+        kernels_.streamRow(origin + y * target.Stride + left, frame_.row(y) + left, pixels);
     }
-    return lit;
 }
 
-void StandardSurface::paintSquares() {
-    const PixelTarget target{frame_.row(0), frame_.stride(), frame_.row(0)};
-    // A unit that stands alone goes straight over the background: what it showed before lies under it.
-    const PixelTarget aloneTarget{frame_.row(0), frame_.stride(), background_.row(0)};
-    const RowRange rows{0, plan_.Height};
-    for (const NotedUnit& noted : noted_) {
-        const PlanUnit& unit = plan_.Units[static_cast<std::size_t>(noted.Unit)];
-        for (std::int32_t i = 0; i < noted.ListedCount; ++i) {
-            const ListedBulb& bulb = listed_[static_cast<std::size_t>(noted.FirstListed + i)];
-            paintSquare(bulb.Sprite, bulb.Alpha, {bulb.Place, unit.Side});
-            noteLit({bulb.Place, unit.Side});
+void StandardSurface::fetchRow(std::size_t band, std::int32_t y) const noexcept {
+    if (y >= plan_.Height) return;
+    const std::uint32_t* row = background_.row(y);
+    for (std::int32_t x = plan_.BandColumns[band].Left; x < plan_.BandColumns[band].Right; x += kCacheLinePixels) {
+        __builtin_prefetch(row + x, 0, 2);
+    }
+}
+
+void StandardSurface::paintThin() {
+    sortIntoBands(
+        plan_, [&](auto&& visit) { forEachNoted(visit); }, bandListed_.Items, bandListed_.First);
+    for (std::size_t band = 0; band < bandLight_.size(); ++band)
+        paintBandThin(band);
+    std::swap(bandListed_, lastListed_);
+}
+
+void StandardSurface::paintBandThin(std::size_t band) {
+    const RowRange rows = bandRows(band);
+    const std::span<const BulbItem> items = bandListed_.of(band);
+    std::uint64_t tiles = 0;
+    if (bandLight_[band] == BandLight::Listed) {
+        const std::span<const BulbItem> last = lastListed_.of(band);
+        const bool same = std::equal(
+            items.begin(), items.end(), last.begin(), last.end(), [&](const BulbItem& item, const BulbItem& before) {
+                const auto unit = static_cast<std::size_t>(item.Unit);
+                return item == before && alpha_[unit] == lastAlpha_[unit] && spriteChanged_[unit] == 0;
+            });
+        if (same) return;
+        for (std::size_t i = 0; i < last.size(); ++i) {
+            if (i + kFetchAhead < last.size()) fetchItem(last[i + kFetchAhead]);
+            restoreItem(last[i], rows);
+            tiles |= tilesOf(last[i]);
         }
-        const std::uint8_t alpha = alpha_[static_cast<std::size_t>(noted.Unit)];
-        if (alpha == 0) continue;
-        for (std::int32_t r = 0; r < unit.RunCount; ++r) {
-            const PlanRun& run = plan_.Runs[static_cast<std::size_t>(unit.FirstRun + r)];
-            const std::span<const BulbPlace> places{plan_.Places.data() + run.FirstPlace,
-                                                    static_cast<std::size_t>(run.PlaceCount)};
-            if (run.WholeOnCanvas) {
-                kernels_.blendBulbs(plan_.Sprites[static_cast<std::size_t>(run.Sprite)], alpha, places, rows,
-                                    unit.Alone && passes_ == 0 ? aloneTarget : target);
-            } else {
-                for (const BulbPlace& place : places)
-                    paintSquare(run.Sprite, alpha, {place, unit.Side});
-            }
-            if (passes_ > 0) {
-                for (const BulbPlace& place : places)
-                    noteLit({place, unit.Side});
-            }
+    } else if (bandLight_[band] != BandLight::None) {
+        const ColumnRange columns = plan_.BandColumns[band];
+        for (std::int32_t y = rows.Top; y < rows.Bottom; ++y) {
+            copyPixels(background_.row(y) + columns.Left, frame_.row(y) + columns.Left, columns.Right - columns.Left);
         }
-        if (passes_ == 0) {
-            litUnits_.push_back(noted.Unit);
-            markUnitTiles(unit);
+        tellBand(band);
+    }
+
+    const PixelTarget target{frame_.row(0), frame_.stride()};
+    for (std::size_t first = 0; first < items.size(); first += kFetchAhead) {
+        const std::size_t end = std::min(items.size(), first + kFetchAhead);
+        for (std::size_t i = end; i < std::min(items.size(), end + kFetchAhead); ++i)
+            fetchItem(items[i]);
+        kernels_.blendItems(items.subspan(first, end - first), alpha_.data(), plan_.Sprites.data(), rows, target);
+        for (std::size_t i = first; i < end; ++i)
+            tiles |= tilesOf(items[i]);
+    }
+    tellTiles(band, tiles);
+    bandLight_[band] = items.empty() ? BandLight::None : BandLight::Listed;
+}
+
+// Calls out of the planned order come here: over what the passes before painted.
+void StandardSurface::paintOver() {
+    const PixelTarget target{frame_.row(0), frame_.stride()};
+    forEachNoted([&](const BulbItem& item) {
+        kernels_.blendItems({&item, 1}, alpha_.data(), plan_.Sprites.data(), {0, plan_.Height}, target);
+        const BandRange bands =
+            bandsOf(item.Place, plan_.Units[static_cast<std::size_t>(item.Unit)].Side, plan_.Height);
+        for (std::int32_t b = bands.First; b <= bands.Last; ++b) {
+            const auto band = static_cast<std::size_t>(b);
+            // One that is Unknown by now was painted in this frame and told then.
+            if (bandLight_[band] != BandLight::Unknown) tellBand(band);
+            bandLight_[band] = BandLight::Unknown;
         }
-    }
+    });
 }
 
-void StandardSurface::paintSquare(std::int32_t sprite, std::uint8_t alpha, const BulbSquare& square) {
-    const BulbSprite& image = plan_.Sprites[static_cast<std::size_t>(sprite)];
-    const PixelTarget target{frame_.row(0), frame_.stride(), frame_.row(0)};
-    if (square.Place.X >= 0 && square.Place.X + square.Side <= plan_.Width) {
-        kernels_.blendBulbs(image, alpha, {&square.Place, 1}, {0, plan_.Height}, target);
-    } else {
-        blendClipped(image, alpha, square.Place.X, square.Place.Y, {target, plan_.Width, plan_.Height});
-    }
-}
-
-// Remembers a square for restoring. Where the list is full, which takes a frame that draws bulbs again and again, its
-// bands are restored whole.
-void StandardSurface::noteLit(const BulbSquare& square) {
-    markTiles(square, plan_.Width, plan_.Height, tiles_);
-    if (lit_.size() < lit_.capacity()) {
-        lit_.push_back(square);
-        return;
-    }
-    const BandRange bands = bandsOf(square, plan_.Height);
-    for (std::int32_t b = bands.First; b <= bands.Last; ++b) {
-        bandLight_[static_cast<std::size_t>(b)] = BandLight::Unknown;
-    }
-}
-
-// Brings the background back wherever the frame before left light that will not be painted over.
-void StandardSurface::restoreLit() {
-    for (std::size_t band = 0; band < bandLight_.size(); ++band) {
-        if (bandLight_[band] != BandLight::None) restoreBand(band);
-    }
-    for (const BulbSquare& square : lit_) {
-        markTiles(square, plan_.Width, plan_.Height, tiles_);
-        restoreSquare(square);
-    }
-    lit_.clear();
-    for (const std::int32_t number : litUnits_) {
-        const PlanUnit& unit = plan_.Units[static_cast<std::size_t>(number)];
-        if (unit.Alone && alpha_[static_cast<std::size_t>(number)] != 0) continue;
-        markUnitTiles(unit);
-        for (std::int32_t r = 0; r < unit.RunCount; ++r) {
-            const PlanRun& run = plan_.Runs[static_cast<std::size_t>(unit.FirstRun + r)];
-            for (std::int32_t p = 0; p < run.PlaceCount; ++p) {
-                restoreSquare({plan_.Places[static_cast<std::size_t>(run.FirstPlace + p)], unit.Side});
-            }
-        }
-    }
-    litUnits_.clear();
-}
-
-void StandardSurface::restoreSquare(const BulbSquare& square) {
-    const std::int32_t left = std::max(0, std::int32_t{square.Place.X});
-    const std::int32_t right = std::min(plan_.Width, square.Place.X + square.Side);
-    const std::int32_t bottom = std::min(plan_.Height, square.Place.Y + square.Side);
-    for (std::int32_t y = std::max(0, std::int32_t{square.Place.Y}); y < bottom; ++y) {
-        const std::uint32_t* from = background_.row(y) + left;
-        std::uint32_t* to = frame_.row(y) + left;
-        std::int32_t x = 0;
-        for (; x + 4 <= right - left; x += 4)
+void StandardSurface::restoreItem(const BulbItem& item, RowRange rows) {
+    const std::int32_t side = plan_.Units[static_cast<std::size_t>(item.Unit)].Side;
+    const std::int32_t bottom = std::min(rows.Bottom, item.Place.Y + side);
+    for (std::int32_t y = std::max(rows.Top, std::int32_t{item.Place.Y}); y < bottom; ++y) {
+        const std::uint32_t* from = background_.row(y) + item.Place.X;
+        std::uint32_t* to = frame_.row(y) + item.Place.X;
+        // Four pixels at a time: whatever lies beside the square is background by now, or is going to be.
+        for (std::int32_t x = 0; x < side; x += 4)
             copyPixels(from + x, to + x, 4);
-        for (; x < right - left; ++x)
-            to[x] = from[x];
     }
 }
 
-void StandardSurface::restoreBand(std::size_t band) {
-    const QRect rect = bandRect(band);
-    for (std::int32_t y = rect.top(); y <= rect.bottom(); ++y) {
-        copyPixels(background_.row(y) + rect.left(), frame_.row(y) + rect.left(), rect.width());
+// Asks for the rows of a small bulb ahead of their use; the rows of large ones the processor fetches by itself.
+void StandardSurface::fetchItem(const BulbItem& item) const noexcept {
+    constexpr std::int32_t kFetchedRows = 4;
+    const std::int32_t first = std::max(0, std::int32_t{item.Place.Y});
+    const std::int32_t end = std::min(plan_.Height, item.Place.Y + kFetchedRows);
+    for (std::int32_t y = first; y < end; ++y) {
+        __builtin_prefetch(background_.row(y) + item.Place.X, 0, 3);
+        __builtin_prefetch(frame_.row(y) + item.Place.X, 1, 3);
     }
-    bandLight_[band] = BandLight::None;
-    changed_.push_back(rect);
 }
 
-// What of the band lights can reach.
-QRect StandardSurface::bandRect(std::size_t band) const {
+RowRange StandardSurface::bandRows(std::size_t band) const noexcept {
     const auto top = static_cast<std::int32_t>(band) * kBandRows;
-    const ColumnRange& columns = plan_.BandColumns[band];
-    return {columns.Left, top, columns.Right - columns.Left, std::min(kBandRows, plan_.Height - top)};
+    return {top, std::min(top + kBandRows, plan_.Height)};
 }
 
-void StandardSurface::markUnitTiles(const PlanUnit& unit) {
-    for (std::int32_t t = 0; t < unit.TileCount; ++t) {
-        const TileRow& tiles = plan_.Tiles[static_cast<std::size_t>(unit.FirstTile + t)];
-        tiles_[static_cast<std::size_t>(tiles.Row)] |= tiles.Bits;
-    }
+std::uint64_t StandardSurface::tilesOf(const BulbItem& item) const noexcept {
+    const std::int32_t side = plan_.Units[static_cast<std::size_t>(item.Unit)].Side;
+    const std::int32_t left = std::max(0, std::int32_t{item.Place.X}) >> kTileShift;
+    const std::int32_t right = (std::min(plan_.Width, item.Place.X + side) - 1) >> kTileShift;
+    return (std::uint64_t{2} << right) - (std::uint64_t{1} << left);
 }
 
-// Runs of tiles in a row become one rectangle.
-void StandardSurface::collectTiles() {
-    const QRect canvas(0, 0, plan_.Width, plan_.Height);
-    for (std::size_t row = 0; row < tiles_.size(); ++row) {
-        std::uint64_t bits = tiles_[row];
-        while (bits != 0) {
-            const int first = std::countr_zero(bits);
-            const int length = std::countr_one(bits >> first);
-            bits &= ~(((std::uint64_t{1} << length) - 1) << first);
-            changed_.push_back(
-                QRect(first << kTileShift, static_cast<int>(row) << kTileShift, length << kTileShift, 1 << kTileShift)
-                    .intersected(canvas));
-        }
-        tiles_[row] = 0;
+void StandardSurface::tellBand(std::size_t band) {
+    const RowRange rows = bandRows(band);
+    const ColumnRange columns = plan_.BandColumns[band];
+    changed_.emplace_back(columns.Left, rows.Top, columns.Right - columns.Left, rows.Bottom - rows.Top);
+}
+
+// Tiles side by side become one rectangle.
+void StandardSurface::tellTiles(std::size_t band, std::uint64_t tiles) {
+    const RowRange rows = bandRows(band);
+    while (tiles != 0) {
+        const int first = std::countr_zero(tiles);
+        const int count = std::countr_one(tiles >> first);
+        tiles &= ~(((std::uint64_t{1} << count) - 1) << first);
+        const std::int32_t left = first << kTileShift;
+        changed_.emplace_back(left, rows.Top, std::min(plan_.Width - left, count << kTileShift),
+                              rows.Bottom - rows.Top);
     }
 }

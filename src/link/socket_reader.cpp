@@ -1,5 +1,7 @@
 #include "link/socket_reader.h"
 
+#include <QNetworkProxy>
+
 #include <array>
 #include <cerrno>
 #include <vector>
@@ -164,6 +166,7 @@ void SocketReader::requested(std::int64_t requestID) {
 
 std::int32_t UdpReader::openSocket() {
     auto socket = std::make_unique<QUdpSocket>();
+    socket->setProxy(QNetworkProxy::NoProxy);  // the stream comes straight from its sender
     // Not shared: two receivers on one port would each get a part of the stream.
     if (!socket->bind(address_, port_, QAbstractSocket::DontShareAddress)) {
         throwOpening(socket->error(), socket->errorString());
@@ -212,6 +215,7 @@ ReceiveBufferAnswer UdpReader::setReceiveBuffer(int bytes) {
 
 std::int32_t TcpReader::openSocket() {
     auto server = std::make_unique<QTcpServer>();
+    server->setProxy(QNetworkProxy::NoProxy);
     if (!server->listen(QHostAddress::AnyIPv4, port_)) throwOpening(server->serverError(), server->errorString());
     server_ = std::move(server);
     return server_->serverPort();

@@ -36,7 +36,7 @@ QImage noisyPicture(int width, int height, SeededRandom& random) {
     QImage picture(width, height, QImage::Format_RGB32);
     for (int y = 0; y < height; ++y) {
         for (int x = 0; x < width; ++x)
-            picture.setPixel(x, y, 0xFF000000U | ZephReturnRandomNumber(0, kWhite, random));
+            picture.setPixel(x, y, 0xFF000000U | static_cast<unsigned>(ZephReturnRandomNumber(0, kWhite, random)));
     }
     return picture;
 }

@@ -14,23 +14,13 @@ namespace {
 
 const std::string kFolder = ZEPH_EXAMPLES;
 
-class NobodyWatching : public DocumentWatcher {
-public:
-    void selectionCleared() override {}
-    void fixtureRemoved(int) override {}
-    void objectListChanged() override {}
-    void canvasChanged() override {}
-    void editSessionReset() override {}
-    void clipboardAndStatusCleared() override {}
-};
-
 // The rig with the example file in it.
 struct LoadedExample {
     LoadedExample() {
         rig.simulation->FilePath = kFolder + "/";
         rig.simulation->FileName = "house.zee";
         const ZephPathService paths(kFolder);
-        NobodyWatching watcher;
+        NoWatcher watcher;
         loaded = ZephLoadVisualizerXML(true, {rig.settings, paths, rig.host, rig.failures, watcher}, *rig.simulation);
     }
     EngineRig rig;

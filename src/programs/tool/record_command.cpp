@@ -6,6 +6,7 @@
 #include "programs/tool/stop_signal.h"
 #include "util/failure.h"
 
+#include <QNetworkProxy>
 #include <QTcpServer>
 #include <QTcpSocket>
 #include <QUdpSocket>
@@ -38,6 +39,7 @@ public:
     UdpSource(const std::string& address, std::int32_t port) : datagram_(65'536, '\0') {
         const QHostAddress local(QString::fromStdString(address));
         require(!local.isNull(), "the address is no IP address");
+        socket_.setProxy(QNetworkProxy::NoProxy);
         if (!socket_.bind(local, static_cast<quint16>(port), QAbstractSocket::DontShareAddress)) {
             throwOpening(socket_.error(), socket_.errorString(), port);
         }
@@ -61,6 +63,7 @@ private:
 class TcpSource : public Source {
 public:
     explicit TcpSource(std::int32_t port) {
+        server_.setProxy(QNetworkProxy::NoProxy);
         if (!server_.listen(QHostAddress::AnyIPv4, static_cast<quint16>(port))) {
             throwOpening(server_.serverError(), server_.errorString(), port);
         }
@@ -86,6 +89,7 @@ private:
 
 void record(const ToolOptions& options) {
     using SteadyClock = std::chrono::steady_clock;
+    StopSignal stop;  // before the sockets: threads that they start must not take the signal
     // The port first: a recording that cannot begin must not cost the capture that stands in its place.
     std::unique_ptr<Source> source;
     if (options.tcp) {
@@ -93,7 +97,6 @@ void record(const ToolOptions& options) {
     } else {
         source = std::make_unique<UdpSource>(options.address, options.port);
     }
-    StopSignal stop;
     CaptureWriter writer(options.out);
     ProgressLine progress;
     const SteadyClock::time_point start = SteadyClock::now();

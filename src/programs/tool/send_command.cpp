@@ -6,6 +6,7 @@
 #include "util/failure.h"
 
 #include <QHostInfo>
+#include <QNetworkProxy>
 #include <QTcpSocket>
 #include <QUdpSocket>
 
@@ -37,7 +38,9 @@ QHostAddress addressOf(const std::string& host) {
 class UdpReceiver : public Receiver {
 public:
     UdpReceiver(const std::string& host, std::int32_t port)
-        : address_(addressOf(host)), port_(static_cast<quint16>(port)) {}
+        : address_(addressOf(host)), port_(static_cast<quint16>(port)) {
+        socket_.setProxy(QNetworkProxy::NoProxy);
+    }
 
     void send(const std::string& bytes, StopSignal& stop) override {
         const qint64 length = static_cast<qint64>(bytes.size());
@@ -57,6 +60,7 @@ private:
 class TcpReceiver : public Receiver {
 public:
     TcpReceiver(const std::string& host, std::int32_t port) {
+        socket_.setProxy(QNetworkProxy::NoProxy);
         socket_.connectToHost(addressOf(host), static_cast<quint16>(port));
         if (!socket_.waitForConnected(kPatienceMs)) throw Failure(socket_.errorString().toStdString());
         socket_.setSocketOption(QAbstractSocket::LowDelayOption, 1);  // a piece is due now, not with the next one
@@ -98,13 +102,13 @@ void send(const ToolOptions& options) {
         std::fprintf(stderr, "%s, line %d: cut short, left out\n", options.file.c_str(), capture.cutLine);
     }
     if (capture.pieces.empty()) return;
+    StopSignal stop;  // before the sockets: threads that they start must not take the signal
     std::unique_ptr<Receiver> receiver;
     if (options.tcp) {
         receiver = std::make_unique<TcpReceiver>(options.host, options.port);
     } else {
         receiver = std::make_unique<UdpReceiver>(options.host, options.port);
     }
-    StopSignal stop;
     ProgressLine progress;
     const std::chrono::duration<double, std::milli> length(std::max(capture.pieces.back().timeMs, 1) / options.speed);
     auto start = std::chrono::steady_clock::now();
