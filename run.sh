@@ -29,5 +29,5 @@ fi
 build/release/bin/zeph-tool send "$show" --loop &
 player=$!
 trap 'kill $player 2>/dev/null || true' EXIT
-echo "The show plays to UDP port 30303. In the window choose Simulation Mode to watch it; Esc leaves it."
-build/release/bin/zeph "$@" "$display"
+echo "The show plays to UDP port 30303, and the window simulates it. Esc or Stop leads to the editor, F5 back."
+build/release/bin/zeph --simulate "$@" "$display"

@@ -28,7 +28,7 @@ __attribute__((target("avx2,popcnt"))) inline std::int32_t notAbove(const std::i
 void KeySearch::clear() {
     count_ = 0;
     blocks_.clear();
-    levelStart_.clear();
+    levels_.clear();
 }
 
 void KeySearch::build(std::span<const std::int32_t> sorted) {
@@ -38,7 +38,7 @@ void KeySearch::build(std::span<const std::int32_t> sorted) {
     std::vector<std::int32_t> level(sorted.begin(), sorted.end());
     for (;;) {
         const std::size_t levelBlocks = (level.size() + kBlock - 1) / kBlock;
-        levelStart_.push_back(static_cast<std::int32_t>(blocks_.size()));
+        levels_.push_back({static_cast<std::int32_t>(blocks_.size()), static_cast<std::int32_t>(levelBlocks) - 1});
         level.resize(levelBlocks * kBlock, kPadding);
         std::vector<std::int32_t> heads;
         for (std::size_t b = 0; b < levelBlocks; ++b) {
@@ -55,14 +55,15 @@ void KeySearch::build(std::span<const std::int32_t> sorted) {
 std::int32_t KeySearch::findPortable(std::int32_t key) const noexcept {
     if (count_ == 0) return 0;
     std::int32_t index = 0;
-    for (std::size_t level = levelStart_.size(); level-- > 0;) {
-        const Block& block = blocks_[static_cast<std::size_t>(levelStart_[level] + index)];
+    for (std::size_t level = levels_.size(); level-- > 0;) {
+        // The highest key possible is not above the padding either, and would lead past the end of the level.
+        const std::int32_t inLevel = std::min(index, levels_[level].last);
+        const Block& block = blocks_[static_cast<std::size_t>(levels_[level].first + inLevel)];
         std::int32_t atMost = 0;
         for (const std::int32_t head : block.keys)
             atMost += head <= key ? 1 : 0;
-        index = index * kBlock + std::max(atMost - 1, 0);
+        index = inLevel * kBlock + std::max(atMost - 1, 0);
     }
-    // The highest key possible is counted among the padding behind it, so the place may lie past the end.
     index = std::min(index, count_ - 1);
     const Block& block = blocks_[static_cast<std::size_t>(index / kBlock)];
     return block.keys[static_cast<std::size_t>(index % kBlock)] == key ? index + 1 : 0;
@@ -78,12 +79,13 @@ __attribute__((target("avx2,popcnt"))) void KeySearch::findManyVector(std::span<
     while (done < keys.size()) {
         const std::size_t lanes = std::min(kLanes, keys.size() - done);
         std::int32_t index[kLanes] = {};
-        for (std::size_t level = levelStart_.size(); level-- > 0;) {
-            const Block* const first = blocks + levelStart_[level];
+        for (std::size_t level = levels_.size(); level-- > 0;) {
+            const Block* const first = blocks + levels_[level].first;
+            const std::int32_t last = levels_[level].last;
             for (std::size_t lane = 0; lane < lanes; ++lane) {
-                const std::int32_t atMost =
-                    notAbove(first[index[lane]].keys.data(), _mm256_set1_epi32(keys[done + lane]));
-                index[lane] = index[lane] * kBlock + (atMost > 0 ? atMost - 1 : 0);
+                const std::int32_t inLevel = std::min(index[lane], last);
+                const std::int32_t atMost = notAbove(first[inLevel].keys.data(), _mm256_set1_epi32(keys[done + lane]));
+                index[lane] = inLevel * kBlock + (atMost > 0 ? atMost - 1 : 0);
             }
         }
         for (std::size_t lane = 0; lane < lanes; ++lane) {

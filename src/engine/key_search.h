@@ -28,9 +28,14 @@ private:
         std::array<std::int32_t, kBlock> keys;
     };
 
+    struct Level {
+        std::int32_t first = 0;  // index of its first block
+        std::int32_t last = 0;   // of its last block, counted from the first
+    };
+
     void findManyVector(std::span<const std::int32_t> keys, std::int32_t* positions) const noexcept;
 
     std::int32_t count_ = 0;
-    std::vector<Block> blocks_;             // level 0 holds the keys, each level above the first key of each block
-    std::vector<std::int32_t> levelStart_;  // first block of each level, lowest level first
+    std::vector<Block> blocks_;  // level 0 holds the keys, each level above the first key of each block
+    std::vector<Level> levels_;  // lowest level first
 };

@@ -1,7 +1,5 @@
 #include "shell/simulation_mode.h"
 
-#include <QDebug>
-
 namespace {
 
 void refuseBackwardClock(Host& host) {
@@ -18,10 +16,7 @@ void refuseBackwardClock(Host& host) {
 
 bool openConnection(Program& program, std::string& ip, std::string& port) {
     const CommunicationsContext context{program.seams.socket, program.seams.lister, program.seams.host,
-                                        program.failures, [](std::string_view line) {
-                                            // No failure, so not for the log, which may show a box.
-                                            qInfo("%.*s", static_cast<int>(line.size()), line.data());
-                                        }};
+                                        program.failures, [&](std::string_view line) { program.failures.note(line); }};
     return ZephSetUpCommunications(context, program.connection, program.adapters, ip, port);
 }
 
@@ -58,10 +53,7 @@ bool startStandardEngine(Program& program, SimulationFace& face) {
 }  // namespace
 
 void mnuSimulationMode_Click(Program& program, SimulationFace& face) {
-    if (program.simulating()) {
-        EndSimulation(program, face);
-        return;
-    }
+    if (program.simulating()) return;
     if (program.seams.clock.timeGetTime() < 0) {
         refuseBackwardClock(program.seams.host);
         ZephSwitchMode(kStateSelectFixture, program, face);
@@ -78,15 +70,14 @@ void mnuSimulationMode_Click(Program& program, SimulationFace& face) {
 }
 
 void ZephSwitchMode(int newState, Program& program, SimulationFace& face) {
-    const bool wasSimulating = program.simulating();
-    if (wasSimulating) ZephCleanUpAfterSimulation(program, face);
+    if (program.simulating()) ZephCleanUpAfterSimulation(program, face);
     if (newState == kStateSimulation) {
         clearLevelDumps(program.receive.Stream.Dumps);
+        program.receive.Stream.ZephStackBuffer.clear();  // only what arrives from now on counts
         program.seams.host.setBusyPointer(true);
         const bool started = startStandardEngine(program, face);
         program.seams.host.setBusyPointer(false);
         if (started) return;
-        face.setTimer(false, kStandardTimerMs);
     }
     face.setTimer(false, kStandardTimerMs);
     program.ZephUIState = kStateSelectFixture;
@@ -100,6 +91,7 @@ void EndSimulation(Program& program, SimulationFace& face) {
     face.setTimer(false, kStandardTimerMs);
     restoreAssembledPoints(*program.simulation, *program.states);
     ZephSwitchMode(kStateSelectFixture, program, face);
+    program.receive.Stream.ZephStackBuffer.clear();
     program.receive.Stream.ZephPayloadSerial = 0;
     face.layOutForEditor();
 }
@@ -108,8 +100,7 @@ void ZephCleanUpAfterSimulation(Program& program, SimulationFace& face) {
     face.showQueueGauge(false);
     program.seams.host.setStatusPanel(3, "");
     ZephRebuildStaticFixtureBulbs(*program.simulation, *program.masks, *program.bulbs);
-    // The window must let go of the frame before the surface gives its pixels back.
-    face.redrawObjects();
+    face.showFrames(program.picBuffer);  // the window must let go of the frame before its pixels are given back
     program.surface.release();
     eraseRenderTables(program.tables);
 }

@@ -12,14 +12,14 @@ public:
     virtual ~SimulationFace() = default;
     virtual void setTimer(bool on, int intervalMs) = 0;  // hrTimer1
     virtual void showQueueGauge(bool shown) = 0;         // prbQueueLen
-    virtual void showFrames(const QImage& frame) = 0;    // picMain shows the engine's frame from here on
+    virtual void showFrames(const QImage& frame) = 0;    // picMain shows this image from here on
     virtual void redrawObjects() = 0;                    // picMain shows the editor's canvas
     virtual void SetControlsForSimulation(bool on) = 0;
     virtual void layOutForEditor() = 0;
     virtual void CheckEnable() = 0;
 };
 
-// Enters simulation; while it runs, leaves it.
+// Enters simulation; does nothing while it runs.
 void mnuSimulationMode_Click(Program& program, SimulationFace& face);
 
 // newState: kStateSimulation or kStateSelectFixture, to which every failure returns.

@@ -28,7 +28,7 @@ void setUpCommunications(Program& program) {
 void ZephStartUp(const StartupMessage& status, Program& program) try {
     program.StartupLoading = true;
     setUpCommunications(program);
-    program.RenderEngine = kEngineStandard;
+    program.RenderEngine = kEngineStandard;  // whatever the setting says, as long as there is no other output
     ZephGlobalReset(false, *program.simulation, program.seams.watcher);
     status("Checking Directories");
     ZephCheckDirectoriesAtStartup(program.paths);

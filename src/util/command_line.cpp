@@ -2,6 +2,15 @@
 
 #include "util/text.h"
 
+std::string commandLineText(const std::vector<std::string>& args) {
+    std::string text;
+    for (const std::string& arg : args) {
+        const bool quoted = arg.empty() || arg.find_first_of(" \t") != std::string::npos;
+        text.append(text.empty() ? "" : " ").append(quoted ? "\"" + arg + "\"" : arg);
+    }
+    return text;
+}
+
 std::vector<std::string> GetCommandLine(std::string_view commandLine, int maxArgs) {
     std::vector<std::string> args;
     bool quoted = false;

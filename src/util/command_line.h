@@ -10,6 +10,10 @@ struct CommandLineParms {
     bool ShowNextError = false;  // the first failure report of the run shows a box
 };
 
+// The text of a command line whose arguments were parted already: each with a blank or tab in it, or empty, stands in
+// double quotes.
+std::string commandLineText(const std::vector<std::string>& args);
+
 // Splits a command line into at most maxArgs arguments. Blanks and tabs part them outside double quotes; the quote
 // characters are dropped.
 std::vector<std::string> GetCommandLine(std::string_view commandLine, int maxArgs);

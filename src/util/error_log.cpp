@@ -24,9 +24,13 @@ void ErrorLog::ErrReport(std::string_view description, std::string_view procedur
     ZephLogError(message);
 }
 
-void ErrorLog::ZephLogError(std::string_view message) {
+void ErrorLog::note(std::string_view message) {
     std::ofstream log(file_, std::ios::app | std::ios::binary);
     log << localTimestamp() << ":" << onOneLine(message) << "\n";
+}
+
+void ErrorLog::ZephLogError(std::string_view message) {
+    note(message);
     // Only the first report of a run shows, and only with the switch: the log has the rest.
     if (showNextError_) {
         showNextError_ = false;

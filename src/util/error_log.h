@@ -19,6 +19,9 @@ public:
     // there is nowhere left to report to.
     void ZephLogError(std::string_view message);
 
+    // Appends a line that is no failure: what the system granted, say. Shows nothing.
+    void note(std::string_view message);
+
 private:
     std::string file_;
     bool showNextError_;

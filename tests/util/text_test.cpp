@@ -34,6 +34,8 @@ TEST(OnOneLine, ShowsEachKindOfLineBreakOnce) {
 TEST(CommandLine, KeepsQuotedBlanksAndDropsTheQuotes) {
     const std::vector<std::string> expected{"a", "my house.zee", "bc"};
     EXPECT_EQ(GetCommandLine("a \t\"my house.zee\"  b\"\"c", 10), expected);
+    EXPECT_EQ(GetCommandLine(commandLineText({"my house.zee", "showerror", "/a/b"}), 10),
+              (std::vector<std::string>{"my house.zee", "showerror", "/a/b"}));
     EXPECT_EQ(GetCommandLine("1 2 3", 2).size(), 2u);
     EXPECT_TRUE(GetCommandLine("  \"\" ", 10).empty());
 }

@@ -4,19 +4,23 @@
 #include "shell/main_window.h"
 #include "shell/startup.h"
 
+#include <QAction>
 #include <QApplication>
 
 namespace {
 
-constexpr std::size_t kMostArguments = 10;
+constexpr int kMostArguments = 10;
 
-// The system's shell has parted the command line already.
-CommandLineParms parmsOf(const QStringList& arguments) {
+// For demonstrations: the simulation runs as soon as the file is open, as if its command had been chosen.
+const QString kSimulateSwitch = QStringLiteral("--simulate");
+
+CommandLineParms parmsOf(QStringList arguments) {
+    arguments.removeFirst();
+    arguments.removeAll(kSimulateSwitch);
     std::vector<std::string> args;
-    for (const QString& argument : arguments.mid(1)) {
-        if (args.size() < kMostArguments) args.push_back(argument.toStdString());
-    }
-    return ProcessCommandLineParms(std::move(args));
+    for (const QString& argument : arguments)
+        args.push_back(argument.toStdString());
+    return ProcessCommandLineParms(GetCommandLine(commandLineText(args), kMostArguments));
 }
 
 }  // namespace
@@ -25,6 +29,7 @@ int main(int argc, char** argv) {
     QApplication application(argc, argv);
     QApplication::setApplicationName("zeph");
     applyLook(application);
+    QApplication::setWindowIcon(simulationIcon());
 
     WindowHost host;
     const SystemClock clock;
@@ -36,5 +41,8 @@ int main(int argc, char** argv) {
     ZephStartUp([](std::string_view) {}, program);
     frmZephMain window(program, host);
     window.start();
+    if (QApplication::arguments().contains(kSimulateSwitch)) {
+        window.findChild<QAction*>("mnuSimulationMode")->trigger();
+    }
     return QApplication::exec();
 }
