@@ -15,12 +15,13 @@ public:
     virtual void restoreIfMinimized() = 0;
     virtual void eraseRubberBand() = 0;  // drawn once more in invert mode, dotted, from start to end of the anchor
     virtual void setCanvasPointer(CanvasPointer pointer) = 0;
-    virtual void stopTimer() = 0;              // hrTimer1
-    virtual void redrawObjects() = 0;          // picMain shows the editor's canvas with ZephSelection
-    virtual void ZephDeselectflg() = 0;        // no row of the object list is highlighted
-    virtual void ZephLoadUIObjectList() = 0;   // the object list anew, from the document
-    virtual void showPressedDrawButton() = 0;  // PressedDrawButton of the state
-    virtual void showModeButtons() = 0;        // chkCmdFixtureOrProp by ZephChangeToggle
+    virtual void stopTimer() = 0;                            // hrTimer1
+    virtual void redrawObjects() = 0;                        // picMain shows the editor's canvas with ZephSelection
+    virtual void ZephHighlightflg(std::int32_t object) = 0;  // the row of the fixture, if it has one
+    virtual void ZephDeselectflg() = 0;                      // no row of the object list is highlighted
+    virtual void ZephLoadUIObjectList() = 0;                 // the object list anew, from the document
+    virtual void showPressedDrawButton() = 0;                // PressedDrawButton of the state
+    virtual void showModeButtons() = 0;                      // chkCmdFixtureOrProp by ZephChangeToggle
     virtual void CheckEnable(bool forceEnable) = 0;
 };
 

@@ -1,5 +1,6 @@
 #include "editor/object_list.h"
 
+#include "editor/tool_bar_texts.h"
 #include "model/document.h"
 #include "util/text.h"
 
@@ -36,4 +37,18 @@ std::vector<ZephListEntry> ZephListIndex(const ZephSimulation& simulation, const
 
 bool listTakesClicks(const ZephSimulation& simulation, const ZephEditorState& editor) noexcept {
     return simulation.SimulationOpen && editor.ZephUIState != kStateSimulation && !drawingInProgress(editor);
+}
+
+void flgObjectSelect_Click(std::int32_t object, const ModeContext& context) {
+    ZephEditorState& editor = context.editor;
+    if (!listTakesClicks(context.simulation, editor)) return;
+    if (editor.ZephUIState == kStateDrawing) ZephSwitchMode(kStateSelectFixture, editor.ZephDrawTool, context);
+    context.face.ZephDeselectflg();
+    // The list is the way to reach an object that is locked, so it can be edited until the canvas selects another.
+    editor.ZephIgnoreLocks = true;
+    editor.ZephSelection.Object = object;
+    context.face.ZephHighlightflg(object);
+    context.face.redrawObjects();
+    context.host.setStatusPanel(2, ZephUpdateStatusBarForUIState(context.simulation, editor, false));
+    context.face.CheckEnable(false);
 }

@@ -1,7 +1,7 @@
 // What the object list beside the canvas shows: the fixtures by name or, where props are selected, the props.
 #pragma once
 
-#include "editor/editor_state.h"
+#include "editor/mode_switch.h"
 
 #include <string>
 #include <vector>
@@ -23,3 +23,7 @@ std::vector<ZephListEntry> ZephListIndex(const ZephSimulation& simulation, const
 // False where the list does not take clicks: in a running
 // simulation, while a stroke is under way and without a document.
 bool listTakesClicks(const ZephSimulation& simulation, const ZephEditorState& editor) noexcept;
+
+// Selects a fixture of the list, locked or not. From Drawing it goes to Select Fixture first. Nothing where the list
+// takes no clicks.
+void flgObjectSelect_Click(std::int32_t object, const ModeContext& context);

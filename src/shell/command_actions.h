@@ -5,7 +5,6 @@
 #include "editor/command_states.h"
 #include "editor/tool_bar_texts.h"
 
-
 #include <QStringList>
 
 #include <functional>

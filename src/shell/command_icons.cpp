@@ -35,9 +35,9 @@ public:
     void paint(QPainter* painter, const QRect& rect, QIcon::Mode mode, QIcon::State) override {
         if (drawing_.isEmpty()) return;
         const bool disabled = mode == QIcon::Disabled;
-        const QColor ink = QApplication::palette().color(disabled ? QPalette::Disabled : QPalette::Active,
-                                                         mode == QIcon::Selected ? QPalette::HighlightedText
-                                                                                 : QPalette::ButtonText);
+        const QColor ink =
+            QApplication::palette().color(disabled ? QPalette::Disabled : QPalette::Active,
+                                          mode == QIcon::Selected ? QPalette::HighlightedText : QPalette::ButtonText);
         QByteArray inked = drawing_;
         inked.replace("currentColor", ink.name().toLatin1());
         QSvgRenderer renderer(inked);

@@ -99,7 +99,8 @@ bool ObjectPanel::eventFilter(QObject* watched, QEvent* event) {
 
 void ObjectPanel::showRows(std::vector<ZephListEntry> rows) {
     rows_ = std::move(rows);
-    const bool twoLines = std::ranges::any_of(rows_, [](const ZephListEntry& row) { return row.Text.contains('\n'); });
+    const bool twoLines =
+        std::ranges::any_of(rows_, [](const ZephListEntry& row) { return row.Text.find('\n') != std::string::npos; });
     flgObjectSelect_->setUpdatesEnabled(false);
     flgObjectSelect_->clearContents();
     flgObjectSelect_->setRowCount(static_cast<int>(rows_.size()));

@@ -74,10 +74,9 @@ OptionsBand::OptionsBand(QWidget* parent) : QWidget(parent) {
     auto* row = new QHBoxLayout(this);
     row->setContentsMargins(0, 0, 0, 0);
     row->setSpacing(3);
-    for (QWidget* control : std::initializer_list<QWidget*>{cmdTextColor_, chkNames_, cmdGridLineColor_,
-                                                            cmbGridLineOption_, cmdToolHandleColor_,
-                                                            lblToolHandleColor_, cmdVertexHandleColor_,
-                                                            lblVertexHandleColor_}) {
+    for (QWidget* control : std::initializer_list<QWidget*>{
+             cmdTextColor_, chkNames_, cmdGridLineColor_, cmbGridLineOption_, cmdToolHandleColor_, lblToolHandleColor_,
+             cmdVertexHandleColor_, lblVertexHandleColor_}) {
         row->addWidget(control);
     }
     row->addSpacing(6);

@@ -47,8 +47,8 @@ QStringList recentFileCaptions(const ZephSettings& settings, const ZephPathServi
         if (file.empty()) break;
         const std::string stored = paths.CollapsePath(file, kEditorFolder);
         // An ampersand of the name is no accelerator.
-        const QString shown = QString::fromStdString(ZephDisplayFileName(
-            kRecentFileLength, ZephPathFromFullPath(stored), ZephNameFromFullPath(stored)));
+        const QString shown = QString::fromStdString(
+            ZephDisplayFileName(kRecentFileLength, ZephPathFromFullPath(stored), ZephNameFromFullPath(stored)));
         captions.append(QString("&%1 ").arg(captions.size() + 1) + QString(shown).replace("&", "&&"));
     }
     return captions;

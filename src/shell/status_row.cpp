@@ -27,10 +27,10 @@ StatusRow::StatusRow(QWidget* parent) : QStatusBar(parent) {
     prbQueueLen_->setToolTip(tr("Received text that waits to be worked off"));
     addPermanentWidget(prbQueueLen_);
     prbQueueLen_->hide();
-    cmdSEPlay_ = button("cmdSEPlay", "sequence-play", "Play", "Start the sequencing program",
-                        &StatusRow::cmdSEPlay_MouseUp);
-    cmdSEStop_ = button("cmdSEStop", "sequence-stop", "Halt", "Stop the sequencing program",
-                        &StatusRow::cmdSEStop_MouseUp);
+    cmdSEPlay_ =
+        button("cmdSEPlay", "sequence-play", "Play", "Start the sequencing program", &StatusRow::cmdSEPlay_MouseUp);
+    cmdSEStop_ =
+        button("cmdSEStop", "sequence-stop", "Halt", "Stop the sequencing program", &StatusRow::cmdSEStop_MouseUp);
     cmdStop_ = button("cmdStop", "stop", "Stop", "End the simulation (Esc)", &StatusRow::cmdStop_MouseUp);
 }
 
@@ -63,9 +63,10 @@ void StatusRow::showQueueLength(const QueueGaugeUpdate& update) {
     if (update.color) {
         const ColorParts parts = ZephColorToRGB(*update.color);
         const QColor color(parts.red, parts.green, parts.blue);
-        prbQueueLen_->setStyleSheet(QString("QProgressBar { border: 1px solid palette(mid); background: palette(base); }"
-                                            "QProgressBar::chunk { background: %1; }")
-                                        .arg(color.name()));
+        prbQueueLen_->setStyleSheet(
+            QString("QProgressBar { border: 1px solid palette(mid); background: palette(base); }"
+                    "QProgressBar::chunk { background: %1; }")
+                .arg(color.name()));
     }
     if (update.value) prbQueueLen_->setValue(*update.value);
 }

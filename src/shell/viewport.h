@@ -1,5 +1,6 @@
 // picViewport with picMain in it and its scroll bars. In the editor HScroll1 and VScroll1 run in per cent, in a
-// simulation in pixels of what picMain exceeds the viewport by. A canvas smaller than the viewport stands in its middle.
+// simulation in pixels of what picMain exceeds the viewport by. A canvas smaller than the viewport stands in its
+// middle.
 #pragma once
 
 #include "shell/picture_box.h"
