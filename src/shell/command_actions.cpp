@@ -103,6 +103,15 @@ void CommandActions::show(const CommandStates& states, bool frozen) {
         if (row.kind == CommandKind::Toggle) action(row.id)->setChecked(state.checked);
         if (twin(row.id) != nullptr) twin(row.id)->setEnabled(enabled);
     }
+    // A menu below another one opens only where something in it can be chosen; inner menus stand behind outer ones.
+    for (auto row = kCommandTable.rbegin(); row != kCommandTable.rend(); ++row) {
+        if (row->kind != CommandKind::Menu || row->menu == Command::None) continue;
+        const bool any = std::ranges::any_of(menu(row->id)->actions(), [](const QAction* item) {
+            return item->isEnabled() && item->isVisible() && !item->isSeparator();
+        });
+        action(row->id)->setEnabled(action(row->id)->isEnabled() && any);
+        if (twin(row->id) != nullptr) twin(row->id)->setEnabled(action(row->id)->isEnabled());
+    }
     popContextMenu_->setEnabled(states.popContextMenu && !frozen);
 }
 

@@ -3,6 +3,7 @@
 #include <QApplication>
 #include <QPainter>
 #include <QPalette>
+#include <QProxyStyle>
 #include <QStyleFactory>
 
 namespace {
@@ -18,6 +19,17 @@ const Tones kDarkTones{{43, 45, 48},    {228, 229, 232}, {122, 124, 130}, {28, 2
 const Tones kLightTones{{240, 240, 241}, {32, 33, 36},    {150, 152, 157}, {255, 255, 255}, {246, 246, 247},
                         {228, 229, 231}, {203, 204, 208}, {176, 178, 183}, {255, 255, 255}, {255, 255, 255},
                         {32, 33, 36},    {201, 124, 18},  {255, 255, 255}};
+
+// Disabled text without the bright edge below it, which on a dark ground is brighter than the text.
+class PlainDisabledText : public QProxyStyle {
+public:
+    using QProxyStyle::QProxyStyle;
+    int styleHint(StyleHint hint, const QStyleOption* option, const QWidget* widget,
+                  QStyleHintReturn* returned) const override {
+        if (hint == SH_EtchDisabledText) return 0;
+        return QProxyStyle::styleHint(hint, option, widget, returned);
+    }
+};
 
 QPalette paletteOf(const Tones& tones) {
     QPalette palette;
@@ -37,6 +49,8 @@ QPalette paletteOf(const Tones& tones) {
     palette.setColor(QPalette::Dark, tones.dark);
     palette.setColor(QPalette::Mid, tones.mid);
     palette.setColor(QPalette::Midlight, tones.light);
+    // A style sheet on a menu takes the etched text from this colour, past the style's own hint.
+    palette.setColor(QPalette::Disabled, QPalette::Light, tones.base);
     for (const QPalette::ColorRole role : {QPalette::WindowText, QPalette::Text, QPalette::ButtonText}) {
         palette.setColor(QPalette::Disabled, role, tones.faint);
     }
@@ -48,6 +62,7 @@ QString styleSheetOf(const Tones& tones) {
     return QString("QToolTip { border: 1px solid %3; padding: 4px; }"
                    "QStatusBar::item { border: none; }"
                    "QStatusBar QLabel { padding: 2px 8px; }"
+                   "QStatusBar #StatusBar1Panel2, #StatusBar1Panel3, #StatusBar1Panel4 { border-left: 1px solid %3; }"
                    "QToolBar { border: none; spacing: 1px; padding: 0px; }"
                    "QToolBar::separator { background: %3; width: 1px; margin: 4px 4px; }"
                    "QToolButton { border: 1px solid transparent; border-radius: 5px; padding: 2px; }"
@@ -56,6 +71,7 @@ QString styleSheetOf(const Tones& tones) {
                    "QToolButton:checked { background: rgba(%2, 70); border-color: rgb(%2); }"
                    "QToolButton:checked:disabled { background: rgba(%2, 30); border-color: rgba(%2, 90); }"
                    "QMenuBar { padding: 2px 4px; }"
+                   "QMenu { border: 1px solid %3; padding: 3px; }"
                    "QMenu::separator { height: 1px; background: %3; margin: 4px 8px; }"
                    "QSplitter::handle { background: transparent; width: 6px; }")
         .arg(QString("%1, %2, %3").arg(tones.text.red()).arg(tones.text.green()).arg(tones.text.blue()),
@@ -86,7 +102,7 @@ QIcon simulationIcon() {
 
 void applyLook(QApplication& application) {
     const Tones& tones = qEnvironmentVariable("ZEPH_LOOK") == "light" ? kLightTones : kDarkTones;
-    application.setStyle(QStyleFactory::create("Fusion"));
+    application.setStyle(new PlainDisabledText(QStyleFactory::create("Fusion")));
     application.setPalette(paletteOf(tones));
     application.setStyleSheet(styleSheetOf(tones));
 }

@@ -10,7 +10,7 @@
 StatusRow::StatusRow(QWidget* parent) : QStatusBar(parent) {
     setObjectName("StatusBar1");
     setSizeGripEnabled(false);
-    constexpr std::array<int, 5> kStretch{0, 2, 7, 3, 2};
+    constexpr std::array<int, 5> kStretch{0, 1, 6, 3, 2};
     for (std::size_t panel = 1; panel < panels_.size(); ++panel) {
         panels_[panel] = new QLabel(this);
         panels_[panel]->setObjectName(QString("StatusBar1Panel%1").arg(panel));
