@@ -3,6 +3,7 @@
 #pragma once
 
 #include "engine/editor_lights.h"
+#include "model/settings.h"
 
 struct EditorCanvas {
     const ZephSimulation& simulation;

@@ -85,16 +85,6 @@ ZEPH_AVX2 void blendHardRows(const BulbMask& mask, const HardBlend& blend, std::
     }
 }
 
-ZEPH_AVX2_INLINE void blendHard(const BulbMask& mask, const HardBlend& blend, std::int32_t first, std::int32_t end,
-                                std::uint32_t* corner, std::ptrdiff_t stride) noexcept {
-    if (mask.Size > 2 || first != 0 || end != 2 * mask.Size) {
-        blendHardRows(mask, blend, first, end, corner, stride);
-        return;
-    }
-    blendRowPair(corner, stride, load(mask.Lanes.data()), blend);
-    if (mask.Size == 2) blendRowPair(corner + 2 * stride, stride, load(mask.Lanes.data() + kBlock), blend);
-}
-
 // Four pixels of a soft image as sixteen words.
 struct SoftHalf {
     __m256i add;    // s x alpha + 128
@@ -151,19 +141,40 @@ ZEPH_AVX2 void blendSoft(const BulbSprite& sprite, std::uint8_t alpha, std::int3
     }
 }
 
+// The masks of sizes 1 and 2 fit two registers. Most bulbs are that small, and neighbours mostly share their mask.
+struct SmallMask {
+    const BulbMask* mask = nullptr;
+    std::int32_t side = 0;
+    __m256i upper;
+    __m256i lower;
+};
+
 ZEPH_AVX2 void blendItems(std::span<const BulbItem> items, const std::uint8_t* alphas, const BulbSprite* sprites,
                           RowRange rows, const PixelTarget& target) noexcept {
+    const PixelTarget to = target;
+    SmallMask small{nullptr, 0, _mm256_setzero_si256(), _mm256_setzero_si256()};
     for (const BulbItem& item : items) {
         const std::uint8_t alpha = alphas[item.Unit];
         if (alpha == 0) continue;
         const BulbSprite& sprite = sprites[item.Sprite];
+        const BulbMask& mask = *sprite.Mask;
+        std::uint32_t* corner = to.Origin + item.Place.Y * to.Stride + item.Place.X;
+        if (&mask != small.mask && !mask.Soft && mask.Size <= 2) {
+            small = {&mask, 2 * mask.Size, load(mask.Lanes.data()),
+                     mask.Size == 2 ? load(mask.Lanes.data() + kBlock) : _mm256_setzero_si256()};
+        }
+        if (&mask == small.mask && item.Place.Y >= rows.Top && item.Place.Y + small.side <= rows.Bottom) {
+            const HardBlend blend = hardBlend(sprite.Color, alpha);
+            blendRowPair(corner, to.Stride, small.upper, blend);
+            if (small.side == 4) blendRowPair(corner + 2 * to.Stride, to.Stride, small.lower, blend);
+            continue;
+        }
         const std::int32_t first = std::max(0, rows.Top - item.Place.Y);
-        const std::int32_t end = std::min(2 * sprite.Mask->Size, rows.Bottom - item.Place.Y);
-        std::uint32_t* corner = target.Origin + item.Place.Y * target.Stride + item.Place.X;
-        if (sprite.Mask->Soft) {
-            blendSoft(sprite, alpha, first, end, corner, target.Stride);
+        const std::int32_t end = std::min(2 * mask.Size, rows.Bottom - item.Place.Y);
+        if (mask.Soft) {
+            blendSoft(sprite, alpha, first, end, corner, to.Stride);
         } else {
-            blendHard(*sprite.Mask, hardBlend(sprite.Color, alpha), first, end, corner, target.Stride);
+            blendHardRows(mask, hardBlend(sprite.Color, alpha), first, end, corner, to.Stride);
         }
     }
 }

@@ -43,7 +43,7 @@ void finishMask(BulbMask& mask) {
 
 }  // namespace
 
-void ZephSetUpMasks(const DimmingCurveBytes& curve, const MaskProgress& progress, ZephMasks& masks) {
+void ZephSetUpMasks(const ZephDimmingCurve& curve, const MaskProgress& progress, ZephMasks& masks) {
     SetUpNormalMasks(progress, masks);
     SetUpFloodMasks(curve, progress, masks);
 }
@@ -72,7 +72,7 @@ void SetUpNormalMasks(const MaskProgress& progress, ZephMasks& masks) {
     }
 }
 
-void SetUpFloodMasks(const DimmingCurveBytes& curve, const MaskProgress& progress, ZephMasks& masks) {
+void SetUpFloodMasks(const ZephDimmingCurve& curve, const MaskProgress& progress, ZephMasks& masks) {
     for (std::int32_t size = 1; size <= kMaxFloodSize; ++size) {
         progress("Creating Bulb Masks - Flood size:" + std::to_string(size));
         BulbMask mask = emptyMask(size, true);

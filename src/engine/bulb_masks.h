@@ -2,6 +2,7 @@
 // start-up, before any bulb image, and kept for the program's life: images point at them.
 #pragma once
 
+#include "model/dimming_curve.h"
 #include "model/tables.h"
 #include "util/one_based.h"
 
@@ -38,12 +39,11 @@ struct ZephMasks {
 
 // Shown on the start-up screen as the work goes on.
 using MaskProgress = std::function<void(std::string_view)>;
-using DimmingCurveBytes = std::array<std::uint8_t, 256>;
 
 // All masks. The curve shapes the glow of floods and must be read before.
-void ZephSetUpMasks(const DimmingCurveBytes& curve, const MaskProgress& progress, ZephMasks& masks);
+void ZephSetUpMasks(const ZephDimmingCurve& curve, const MaskProgress& progress, ZephMasks& masks);
 void SetUpNormalMasks(const MaskProgress& progress, ZephMasks& masks);
-void SetUpFloodMasks(const DimmingCurveBytes& curve, const MaskProgress& progress, ZephMasks& masks);
+void SetUpFloodMasks(const ZephDimmingCurve& curve, const MaskProgress& progress, ZephMasks& masks);
 
 // The mask of a fixture's bulbs: by size for floods, by size and shape for the others. nullptr where the tables have
 // none (a damaged file's size or shape, or masks not made): such bulbs are not drawn.

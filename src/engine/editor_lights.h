@@ -1,24 +1,33 @@
-// The lights as the editor shows them: straight from the points of the document, without a render table.
+// Fixtures as the editor shows them: their bulbs at the present points, in colour or as silhouettes. Drawn from the
+// records as they change, so nothing needs to be compiled first; only the fixtures' static images must be up to date.
 #pragma once
 
 #include "engine/bulb_images.h"
-#include "model/dimming_curve.h"
-#include "model/settings.h"
+#include "model/simulation.h"
 
 #include <QImage>
 
-struct EditorLights {
-    const ZephSimulation& simulation;
-    const ZephSettings& settings;
-    const ZephDimmingCurve& curve;
-    const ZephStaticBulbs& bulbs;
+#include <cstdint>
+
+struct EditorLightsContext {
+    const ZephSimulation& Document;
+    const ZephStaticBulbs& Bulbs;
+    const ZephDimmingCurve& Curve;
+    bool EditInColor = false;  // the setting of that name
 };
 
-// Paints one fixture: in colour or as a silhouette, at full strength or dimmed where its level is closed to editing.
-// target: Format_RGB32, canvas size.
-void ZephDrawEditorLights(const EditorLights& lights, int fixture, QImage& target);
+// A fixture (1..FixtureCount) as its level and the settings have it: all channels in colour, or one silhouette; dimmed
+// on a level that is closed to editing, and not at all where such levels are hidden. canvas: Format_RGB32, canvas
+// pixels; bulbs are cut at its edges. Other numbers and formats draw nothing.
+void ZephDrawEditorLights(const EditorLightsContext& context, std::int32_t fixture, QImage& canvas);
 
-// Paints the bulbs of one channel, 1..16, at an intensity of 0..100. drawBlack: as a silhouette. pixelNumber: that
-// point alone, for fixtures whose points are bulbs; 0 = all.
-void ZephDrawLights(const EditorLights& lights, int fixture, int channel, std::int32_t intensity, bool drawBlack,
-                    std::int32_t pixelNumber, QImage& target);
+struct LightsDraw {
+    std::int32_t Fixture = 0;
+    std::int32_t Channel = 1;
+    std::int32_t Intensity = 0;    // 0..100
+    bool DrawBlack = false;        // a silhouette
+    std::int32_t PixelNumber = 0;  // draws this point alone, unless the fixture has no such point; not for strings
+};
+
+// The bulbs of one channel. A fixture without channels is drawn as a silhouette.
+void ZephDrawLights(const EditorLightsContext& context, const LightsDraw& draw, QImage& canvas);

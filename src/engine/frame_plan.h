@@ -7,6 +7,7 @@
 #include "engine/fixture_state.h"
 #include "engine/render_table.h"
 
+#include <algorithm>
 #include <cstdint>
 #include <span>
 #include <vector>
@@ -17,7 +18,6 @@ inline constexpr std::int32_t kBandRows = 32;
 // A plain channel or an RGB group. Units are numbered from 1 in the order of painting.
 struct PlanUnit {
     std::int32_t Fixture = 0;
-    std::int32_t Channel = 0;      // 0 = an RGB group
     std::int32_t FirstSprite = 0;  // into SpriteOf: one, or one a colour of a Multi Color channel
     std::int32_t SpriteCount = 0;  // 0 = the fixture's size or shape has no mask: nothing is drawn
     std::int32_t FirstItem = 0;    // into Items: its bulbs, unless they come as lists
@@ -32,6 +32,8 @@ struct ColumnRange {
     std::int32_t Right = 0;  // one past the last
 };
 
+// LocalItems paints the same picture as BandItems: bulbs that may touch keep their order, the others go from left to
+// right, so that the pixels under work stay in the first-level cache.
 struct FramePlan {
     std::int32_t Width = 0;  // pixels, the canvas
     std::int32_t Height = 0;
@@ -43,7 +45,8 @@ struct FramePlan {
     std::vector<BulbSprite> Sprites;          // those of groups change from frame to frame, the others are shared
     std::vector<BulbItem> Items;              // by unit
     std::vector<BulbItem> BandItems;          // by band, within it in the order of painting
-    std::vector<std::int32_t> FirstBandItem;  // [band], one more than bands
+    std::vector<BulbItem> LocalItems;         // the same bands, in an order that stays near itself: see below
+    std::vector<std::int32_t> FirstBandItem;  // [band], one more than bands; for both
     std::vector<ColumnRange> BandColumns;     // [band], all that lights can reach
     std::int32_t ListedBulbs = 0;             // bulbs of units that are drawn by lists: ribbons, pixels, strobes
     std::int32_t MaxSide = 0;                 // pixels
@@ -57,7 +60,9 @@ struct BandRange {
     std::int32_t Last = 0;
 };
 // The bands that an image touches, given that it touches the canvas.
-BandRange bandsOf(BulbPlace place, std::int32_t side, std::int32_t height) noexcept;
+inline BandRange bandsOf(BulbPlace place, std::int32_t side, std::int32_t height) noexcept {
+    return {std::max(0, std::int32_t{place.Y}) / kBandRows, (std::min(height, place.Y + side) - 1) / kBandRows};
+}
 
 // A place whose image touches the canvas.
 bool touchesCanvas(std::int64_t x, std::int64_t y, std::int32_t side, std::int32_t width, std::int32_t height) noexcept;

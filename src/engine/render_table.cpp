@@ -100,7 +100,8 @@ void TableBuilder::slotAddress(std::int32_t key, int fixture, std::int32_t chann
                                bool skipZero) {
     if (key == 0 && skipZero) return;
     const ZephFixture& record = simulation_.Fixtures[fixture];
-    if (record.ZOrder < 1 || record.ZOrder > kLevels) {
+    // Level 0 has a place in the table and is never drawn, as the level of a fixture whose file says so.
+    if (record.ZOrder < 0 || record.ZOrder > kLevels) {
         report("Subscript out of range", "AddRenderData", reportedLevel_);
         return;
     }

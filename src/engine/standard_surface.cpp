@@ -27,7 +27,7 @@ bool StandardSurface::prepare(const SurfaceScene& scene, FailureReport& failures
     }
 
     plan_ = makeFramePlan(scene.Document, scene.Tables, scene.States, scene.Masks, scene.Bulbs, width, height);
-    reachedPixels_ = reachedPixels(plan_);
+    thinLimit_ = reachedPixels(plan_) * 3 / 4;
     pool_.reserve(plan_.Groups, plan_.FloodGroups, plan_.MaxFloodSize);
     frame_.resize(width, height);
     background_.resize(width, height);
@@ -46,6 +46,11 @@ bool StandardSurface::prepare(const SurfaceScene& scene, FailureReport& failures
     for (BandLists* lists : {&bandListed_, &lastListed_}) {
         lists->Items.assign(plan_.BandItems.size() + listed_.capacity() * bandsOfBulb, {});
         lists->First.assign(bands + 1, 0);
+    }
+    for (SavedPixels* saved : {&saved_, &lastSaved_}) {
+        // A bulb of the smallest size saves twice its pixels.
+        saved->Pixels.resize(2 * static_cast<std::size_t>(thinLimit_));
+        saved->End.assign(bands + 1, 0);
     }
     changed_.reserve(2 + bands * kMostRectsOfBand);
     bandLight_.assign(bands, BandLight::None);
@@ -68,6 +73,8 @@ void StandardSurface::release() {
     band_ = {};
     bandListed_ = {};
     lastListed_ = {};
+    saved_ = {};
+    lastSaved_ = {};
     notedWhole_.clear();
     listed_.clear();
     changed_.clear();

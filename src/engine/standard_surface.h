@@ -76,6 +76,19 @@ private:
         }
     };
 
+    // What lay under the bulbs of a thinly lit frame, one after the other in the order of painting.
+    struct SavedPixels {
+        std::vector<std::uint32_t> Pixels;
+        std::vector<std::int32_t> End;  // [band + 1]
+        std::int32_t Used = 0;
+    };
+    struct Square {
+        std::int32_t Left = 0;  // pixels
+        std::int32_t Width = 0;
+        std::int32_t Top = 0;
+        std::int32_t Bottom = 0;
+    };
+
     void noteUnit(std::int32_t unit, std::uint8_t alpha);
     void noteWhole(std::int32_t unit);
     void listBulb(std::int32_t unit, std::int32_t bulb0);
@@ -92,7 +105,10 @@ private:
     void paintBandThin(std::size_t band);
     void paintOver();
 
-    void restoreItem(const BulbItem& item, RowRange rows);
+    std::uint64_t restoreBand(std::size_t band, std::span<const BulbItem> last);
+    void saveUnder(const BulbItem& item, RowRange rows);
+    void keepSaved(std::size_t band);
+    Square squareOf(const BulbItem& item, RowRange rows) const noexcept;
     void fetchItem(const BulbItem& item) const noexcept;
     void fetchRow(std::size_t band, std::int32_t y) const noexcept;
     std::span<const BulbItem> plannedOf(std::size_t band) const noexcept;
@@ -104,7 +120,7 @@ private:
     const BlendKernels& kernels_;
     std::optional<SurfaceScene> scene_;
     FramePlan plan_;
-    std::int64_t reachedPixels_ = 0;  // that lights can reach
+    std::int64_t thinLimit_ = 0;  // pixels: frames that cost more are painted as dense ones
     ZephRGBBulbCache cache_;
     RGBBulbPool pool_;
 
@@ -125,12 +141,14 @@ private:
     std::int64_t litPixels_ = 0;
     std::int32_t passes_ = 0;
     BandLists bandListed_;
+    SavedPixels saved_;
     std::vector<QRect> changed_;
 
     // What the frame before left on the picture.
     std::vector<std::uint8_t> lastAlpha_;
     std::vector<std::uint8_t> lastWhole_;
     BandLists lastListed_;
+    SavedPixels lastSaved_;
     std::vector<BandLight> bandLight_;
     bool lastRepeats_ = false;   // lastWhole_ and the images tell all of it
     bool wholeChanged_ = false;  // the background was replaced

@@ -1,6 +1,6 @@
 // How the standard surface paints what was noted. A densely lit frame: each band of rows is put together in the cache,
-// from the background up, and streamed out. A thinly lit one: the squares of its bulbs are sorted by bands, and in each
-// band those of the frame before are restored and the new ones blended where they lie.
+// from the background up, and streamed out. A thinly lit one: its bulbs are sorted by bands, and in each band those of
+// the frame before are taken away and the new ones blended where they lie.
 #include "engine/standard_surface.h"
 
 #include <algorithm>
@@ -11,10 +11,21 @@ namespace {
 
 constexpr std::int32_t kTileShift = 6;  // columns of 64 pixels tell what of a band has changed
 static_assert(kMaxCanvasPixels >> kTileShift < 63);
-constexpr std::size_t kFetchAhead = 8;  // bulbs
+constexpr std::size_t kFetchAhead = 16;  // bulbs
 
 void copyPixels(const std::uint32_t* from, std::uint32_t* to, std::int32_t pixels) noexcept {
     std::memcpy(to, from, static_cast<std::size_t>(pixels) * sizeof(std::uint32_t));
+}
+
+// Pixels of the image's side. The few images stay in the cache, the many units do not.
+std::int32_t sideOf(const BulbItem& item, const FramePlan& plan) noexcept {
+    return 2 * plan.Sprites[static_cast<std::size_t>(item.Sprite)].Mask->Size;
+}
+
+// pixels is a multiple of four.
+void copyFours(const std::uint32_t* from, std::uint32_t* to, std::int32_t pixels) noexcept {
+    for (std::int32_t x = 0; x < pixels; x += 4)
+        copyPixels(from + x, to + x, 4);
 }
 
 // A counting sort: forEach visits the items in the order of painting, twice, and that order stays within a band.
@@ -22,7 +33,7 @@ template <typename ForEach>
 void sortIntoBands(const FramePlan& plan, ForEach forEach, std::vector<BulbItem>& sorted,
                    std::vector<std::int32_t>& first) {
     const auto forBands = [&](const BulbItem& item, auto&& visit) {
-        const BandRange bands = bandsOf(item.Place, plan.Units[static_cast<std::size_t>(item.Unit)].Side, plan.Height);
+        const BandRange bands = bandsOf(item.Place, sideOf(item, plan), plan.Height);
         for (std::int32_t band = bands.First; band <= bands.Last; ++band)
             visit(static_cast<std::size_t>(band));
     };
@@ -42,6 +53,25 @@ void sortIntoBands(const FramePlan& plan, ForEach forEach, std::vector<BulbItem>
 }
 
 }  // namespace
+
+RowRange StandardSurface::bandRows(std::size_t band) const noexcept {
+    const auto top = static_cast<std::int32_t>(band) * kBandRows;
+    return {top, std::min(top + kBandRows, plan_.Height)};
+}
+
+inline std::uint64_t StandardSurface::tilesOf(const BulbItem& item) const noexcept {
+    const std::int32_t side = sideOf(item, plan_);
+    const std::int32_t left = std::max(0, std::int32_t{item.Place.X}) >> kTileShift;
+    const std::int32_t right = (std::min(plan_.Width, item.Place.X + side) - 1) >> kTileShift;
+    return (std::uint64_t{2} << right) - (std::uint64_t{1} << left);
+}
+
+// The rows of the image within the band, whole fours of pixels wide.
+inline StandardSurface::Square StandardSurface::squareOf(const BulbItem& item, RowRange rows) const noexcept {
+    const std::int32_t side = sideOf(item, plan_);
+    return {item.Place.X, (side + 3) / 4 * 4, std::max(rows.Top, std::int32_t{item.Place.Y}),
+            std::min(rows.Bottom, item.Place.Y + side)};
+}
 
 void StandardSurface::endFrame() {
     if (!scene_) return;
@@ -85,7 +115,7 @@ void StandardSurface::paintNoted() {
 // long, lie thin for longer.
 bool StandardSurface::worthBands() const noexcept {
     constexpr std::int64_t kBulbCost = 58;  // in pixels painted thin
-    return 4 * (litPixels_ + kBulbCost * litBulbs_) > 3 * reachedPixels_;
+    return litPixels_ + kBulbCost * litBulbs_ > thinLimit_;
 }
 
 // visit(item) for all that was noted, in the order of painting.
@@ -129,8 +159,10 @@ bool StandardSurface::denseBandChanged(std::size_t band) const noexcept {
 }
 
 std::span<const BulbItem> StandardSurface::plannedOf(std::size_t band) const noexcept {
+    // Listed bulbs are merged by the order of units, which only BandItems keep.
+    const std::vector<BulbItem>& items = bandListed_.of(band).empty() ? plan_.LocalItems : plan_.BandItems;
     const std::int32_t first = plan_.FirstBandItem[band];
-    return {plan_.BandItems.data() + first, static_cast<std::size_t>(plan_.FirstBandItem[band + 1] - first)};
+    return {items.data() + first, static_cast<std::size_t>(plan_.FirstBandItem[band + 1] - first)};
 }
 
 // Puts the band together in the cache, planned and listed bulbs merged by the order of their units, and streams it out.
@@ -190,9 +222,11 @@ void StandardSurface::fetchRow(std::size_t band, std::int32_t y) const noexcept 
 void StandardSurface::paintThin() {
     sortIntoBands(
         plan_, [&](auto&& visit) { forEachNoted(visit); }, bandListed_.Items, bandListed_.First);
+    saved_.Used = 0;
     for (std::size_t band = 0; band < bandLight_.size(); ++band)
         paintBandThin(band);
     std::swap(bandListed_, lastListed_);
+    std::swap(saved_, lastSaved_);
 }
 
 void StandardSurface::paintBandThin(std::size_t band) {
@@ -206,12 +240,11 @@ void StandardSurface::paintBandThin(std::size_t band) {
                 const auto unit = static_cast<std::size_t>(item.Unit);
                 return item == before && alpha_[unit] == lastAlpha_[unit] && spriteChanged_[unit] == 0;
             });
-        if (same) return;
-        for (std::size_t i = 0; i < last.size(); ++i) {
-            if (i + kFetchAhead < last.size()) fetchItem(last[i + kFetchAhead]);
-            restoreItem(last[i], rows);
-            tiles |= tilesOf(last[i]);
+        if (same) {
+            keepSaved(band);
+            return;
         }
+        tiles |= restoreBand(band, last);
     } else if (bandLight_[band] != BandLight::None) {
         const ColumnRange columns = plan_.BandColumns[band];
         for (std::int32_t y = rows.Top; y < rows.Bottom; ++y) {
@@ -221,16 +254,52 @@ void StandardSurface::paintBandThin(std::size_t band) {
     }
 
     const PixelTarget target{frame_.row(0), frame_.stride()};
-    for (std::size_t first = 0; first < items.size(); first += kFetchAhead) {
-        const std::size_t end = std::min(items.size(), first + kFetchAhead);
-        for (std::size_t i = end; i < std::min(items.size(), end + kFetchAhead); ++i)
-            fetchItem(items[i]);
-        kernels_.blendItems(items.subspan(first, end - first), alpha_.data(), plan_.Sprites.data(), rows, target);
-        for (std::size_t i = first; i < end; ++i)
-            tiles |= tilesOf(items[i]);
+    for (std::size_t i = 0; i < items.size(); ++i) {
+        if (i + kFetchAhead < items.size()) fetchItem(items[i + kFetchAhead]);
+        saveUnder(items[i], rows);
+        kernels_.blendItems(items.subspan(i, 1), alpha_.data(), plan_.Sprites.data(), rows, target);
+        tiles |= tilesOf(items[i]);
     }
+    saved_.End[band + 1] = saved_.Used;
     tellTiles(band, tiles);
     bandLight_[band] = items.empty() ? BandLight::None : BandLight::Listed;
+}
+
+// What lies under a bulb is saved before it is blended and put back in reverse order in the next frame: read one after
+// the other, where the background's own rows would be so many more cache misses.
+std::uint64_t StandardSurface::restoreBand(std::size_t band, std::span<const BulbItem> last) {
+    const RowRange rows = bandRows(band);
+    std::uint64_t tiles = 0;
+    const std::uint32_t* from = lastSaved_.Pixels.data() + lastSaved_.End[band + 1];
+    for (std::size_t i = last.size(); i-- > 0;) {
+        if (i >= kFetchAhead) fetchItem(last[i - kFetchAhead]);
+        const Square square = squareOf(last[i], rows);
+        from -= square.Width * (square.Bottom - square.Top);
+        const std::uint32_t* row = from;
+        for (std::int32_t y = square.Top; y < square.Bottom; ++y, row += square.Width) {
+            copyFours(row, frame_.row(y) + square.Left, square.Width);
+        }
+        tiles |= tilesOf(last[i]);
+    }
+    return tiles;
+}
+
+void StandardSurface::saveUnder(const BulbItem& item, RowRange rows) {
+    const Square square = squareOf(item, rows);
+    std::uint32_t* to = saved_.Pixels.data() + saved_.Used;
+    for (std::int32_t y = square.Top; y < square.Bottom; ++y, to += square.Width) {
+        copyFours(frame_.row(y) + square.Left, to, square.Width);
+    }
+    saved_.Used += square.Width * (square.Bottom - square.Top);
+}
+
+// The band stays as it is, and so does what lies under its bulbs.
+void StandardSurface::keepSaved(std::size_t band) {
+    const auto first = lastSaved_.Pixels.begin() + lastSaved_.End[band];
+    const auto end = lastSaved_.Pixels.begin() + lastSaved_.End[band + 1];
+    std::copy(first, end, saved_.Pixels.begin() + saved_.Used);
+    saved_.Used += static_cast<std::int32_t>(end - first);
+    saved_.End[band + 1] = saved_.Used;
 }
 
 // Calls out of the planned order come here: over what the passes before painted.
@@ -238,8 +307,7 @@ void StandardSurface::paintOver() {
     const PixelTarget target{frame_.row(0), frame_.stride()};
     forEachNoted([&](const BulbItem& item) {
         kernels_.blendItems({&item, 1}, alpha_.data(), plan_.Sprites.data(), {0, plan_.Height}, target);
-        const BandRange bands =
-            bandsOf(item.Place, plan_.Units[static_cast<std::size_t>(item.Unit)].Side, plan_.Height);
+        const BandRange bands = bandsOf(item.Place, sideOf(item, plan_), plan_.Height);
         for (std::int32_t b = bands.First; b <= bands.Last; ++b) {
             const auto band = static_cast<std::size_t>(b);
             // One that is Unknown by now was painted in this frame and told then.
@@ -249,39 +317,14 @@ void StandardSurface::paintOver() {
     });
 }
 
-void StandardSurface::restoreItem(const BulbItem& item, RowRange rows) {
-    const std::int32_t side = plan_.Units[static_cast<std::size_t>(item.Unit)].Side;
-    const std::int32_t bottom = std::min(rows.Bottom, item.Place.Y + side);
-    for (std::int32_t y = std::max(rows.Top, std::int32_t{item.Place.Y}); y < bottom; ++y) {
-        const std::uint32_t* from = background_.row(y) + item.Place.X;
-        std::uint32_t* to = frame_.row(y) + item.Place.X;
-        // Four pixels at a time: whatever lies beside the square is background by now, or is going to be.
-        for (std::int32_t x = 0; x < side; x += 4)
-            copyPixels(from + x, to + x, 4);
-    }
-}
-
 // Asks for the rows of a small bulb ahead of their use; the rows of large ones the processor fetches by itself.
 void StandardSurface::fetchItem(const BulbItem& item) const noexcept {
     constexpr std::int32_t kFetchedRows = 4;
     const std::int32_t first = std::max(0, std::int32_t{item.Place.Y});
     const std::int32_t end = std::min(plan_.Height, item.Place.Y + kFetchedRows);
     for (std::int32_t y = first; y < end; ++y) {
-        __builtin_prefetch(background_.row(y) + item.Place.X, 0, 3);
         __builtin_prefetch(frame_.row(y) + item.Place.X, 1, 3);
     }
-}
-
-RowRange StandardSurface::bandRows(std::size_t band) const noexcept {
-    const auto top = static_cast<std::int32_t>(band) * kBandRows;
-    return {top, std::min(top + kBandRows, plan_.Height)};
-}
-
-std::uint64_t StandardSurface::tilesOf(const BulbItem& item) const noexcept {
-    const std::int32_t side = plan_.Units[static_cast<std::size_t>(item.Unit)].Side;
-    const std::int32_t left = std::max(0, std::int32_t{item.Place.X}) >> kTileShift;
-    const std::int32_t right = (std::min(plan_.Width, item.Place.X + side) - 1) >> kTileShift;
-    return (std::uint64_t{2} << right) - (std::uint64_t{1} << left);
 }
 
 void StandardSurface::tellBand(std::size_t band) {

@@ -90,7 +90,10 @@ void frmZephMain::mnuRecentFiles_Click(int index) {
 }
 
 void frmZephMain::UpdateRecentFileMenu() {
-    commands_->showRecentFiles(recentFileCaptions(program_.settings, program_.paths));
+    QStringList captions;
+    for (const std::string& caption : ZephRecentFileCaptions(program_.settings, program_.paths))
+        captions.append(QString::fromStdString(caption));
+    commands_->showRecentFiles(captions);
 }
 
 void frmZephMain::mnuFileExit_Click() {

@@ -2,8 +2,8 @@
 
 #include "model/tables.h"
 #include "shell/command_icons.h"
+#include "shell/dialogs/color_button.h"
 #include "shell/window_host.h"
-#include "util/color.h"
 
 #include <QComboBox>
 #include <QHBoxLayout>
@@ -19,11 +19,6 @@ constexpr int kIconPixels = 20;
 // Only the brightness acts on anything that is painted so far; the canvas has neither names nor grid nor handles, so
 // the controls for them show the options and stay disabled.
 constexpr bool kPaintsNamesGridAndHandles = false;
-
-QColor toQColor(std::int32_t color) {
-    const ColorParts parts = ZephColorToRGB(color);
-    return QColor(parts.red, parts.green, parts.blue);
-}
 
 void showSwatch(QLabel& label, std::int32_t color) {
     label.setStyleSheet(

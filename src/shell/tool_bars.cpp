@@ -26,16 +26,28 @@ CoolBar::CoolBar(const CommandActions& actions, QWidget* parent) : QWidget(paren
     DrawToolBar_ = buildBar("DrawToolBar", kDrawButtons, drawButtonCommand, actions);
     band_ = new OptionsBand(this);
 
-    auto* upper = new QHBoxLayout;
-    upper->setSpacing(8);
-    upper->addWidget(EditToolBar_);
-    upper->addStretch();
-    upper->addWidget(band_);
-    auto* rows = new QVBoxLayout(this);
-    rows->setContentsMargins(6, 3, 8, 4);
-    rows->setSpacing(2);
-    rows->addLayout(upper);
-    rows->addWidget(DrawToolBar_);
+    rows_ = new QVBoxLayout(this);
+    rows_->setContentsMargins(6, 3, 8, 4);
+    rows_->setSpacing(2);
+    arrange(firstToolBandLayout());
+}
+
+void CoolBar::arrange(const ToolBandLayout& layout) {
+    while (QLayoutItem* row = rows_->takeAt(0))
+        delete row;  // a row owns its places, not the bars in them
+    QHBoxLayout* row = nullptr;
+    for (const ToolBand& place : layout.Bands) {
+        auto* bar = findChild<QWidget*>(QString::fromStdString(place.ChildName), Qt::FindDirectChildrenOnly);
+        if (bar == nullptr) continue;
+        if (row == nullptr || place.NewRow) {
+            row = new QHBoxLayout;
+            row->setSpacing(8);
+            rows_->addLayout(row);
+        } else {
+            row->addStretch();
+        }
+        row->addWidget(bar);
+    }
 }
 
 QToolBar* CoolBar::buildBar(const char* name, int buttons, Command (*commandAt)(int), const CommandActions& actions) {

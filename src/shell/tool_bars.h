@@ -4,16 +4,20 @@
 
 #include "shell/command_actions.h"
 #include "shell/options_band.h"
+#include "shell/tool_bands.h"
 
 #include <QWidget>
 
 class QToolBar;
+class QVBoxLayout;
 
 class CoolBar : public QWidget {
 public:
     CoolBar(const CommandActions& actions, QWidget* parent);
 
     void show(const CommandStates& states, bool frozen);
+    // Puts the bars into the rows and the order of the layout; each is as wide as what stands in it.
+    void arrange(const ToolBandLayout& layout);
     OptionsBand& band() { return *band_; }
 
     using QWidget::show;
@@ -28,4 +32,5 @@ private:
     QToolBar* EditToolBar_ = nullptr;
     QToolBar* DrawToolBar_ = nullptr;
     OptionsBand* band_ = nullptr;
+    QVBoxLayout* rows_ = nullptr;
 };

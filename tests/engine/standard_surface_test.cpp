@@ -22,7 +22,7 @@ public:
 const ZephMasks& masks() {
     static const std::unique_ptr<ZephMasks> made = [] {
         auto all = std::make_unique<ZephMasks>();
-        DimmingCurveBytes curve;
+        ZephDimmingCurve curve;
         for (std::size_t i = 0; i < curve.size(); ++i)
             curve[i] = static_cast<std::uint8_t>(i);
         ZephSetUpMasks(
@@ -244,4 +244,58 @@ TEST(StandardSurface, ShowsTheSamePixelsAsTheReference) {
         comparePictures(seed, blendKernels(BlendForm::Portable));
         if (HasFatalFailure()) return;
     }
+}
+
+TEST(StandardSurface, TellsNothingWhileThePictureStaysAndOnlyTheBulbThatMoved) {
+    Stage stage;
+    stage.background = QImage(400, 300, QImage::Format_RGB32);
+    stage.background.fill(0xFF102030U);
+    for (const std::int32_t x : {20, 300}) {
+        ZephFixture& fixture = stage.add(kFixtureBulbs, kChannelNormal, 2, 1);
+        fixture.Channels[1].Color = packColor(255, 0, 0);
+        Stage::addPoint(fixture, kPointBulb, x, 100);
+    }
+    stage.finish();
+    SilentReport report;
+    StandardSurface surface;
+    ASSERT_TRUE(surface.prepare(stage.scene(stage.tables), report));
+    const auto frame = [&](std::uint8_t first, std::uint8_t second) {
+        surface.beginFrame();
+        surface.drawChannel({1, 1, 1, 0, first});
+        surface.drawChannel({1, 2, 1, 0, second});
+        surface.endFrame();
+        return std::vector<QRect>(surface.changedRects().begin(), surface.changedRects().end());
+    };
+    EXPECT_EQ(frame(0, 0), std::vector<QRect>{QRect(0, 0, 400, 300)});  // the picture is new
+    EXPECT_EQ(frame(0, 0).size(), 0U);
+    EXPECT_GT(frame(255, 128).size(), 0U);
+    EXPECT_EQ(frame(255, 128).size(), 0U);
+    EXPECT_EQ(surface.image().pixel(20, 100), 0xFFFF0000U);
+    EXPECT_EQ(surface.image().pixel(300, 100), 0xFF881018U);  // (16 x 127 + 255 x 128) / 255 = 135.97, 15.9, 23.9
+    frame(0, 0);
+    EXPECT_EQ(surface.image(), stage.background);
+}
+
+TEST(StandardSurface, RefusesACanvasOrTablesThatItCannotDraw) {
+    Stage stage;
+    ZephFixture& fixture = stage.add(kFixtureBulbs, kChannelRgb, 2, 1);
+    Stage::addPoint(fixture, kPointBulb, 5, 5);
+    stage.finish();
+    SilentReport report;
+    StandardSurface surface;
+    const auto prepared = [&](int width, int height, std::int32_t handle) {
+        stage.background = QImage(width, height, QImage::Format_RGB32);
+        stage.tables.RGBData[1].Bulb = handle;
+        return surface.prepare(stage.scene(stage.tables), report);
+    };
+    EXPECT_FALSE(prepared(0, 0, 0));
+    EXPECT_FALSE(prepared(2501, 10, 0));
+    EXPECT_FALSE(prepared(10, 10, 3));
+    EXPECT_EQ(report.count, 3);
+    surface.beginFrame();  // unprepared: nothing happens
+    surface.drawGroup({1, 1, 1, 0, kWhite, 255}, stage.tables.RGBData[1]);
+    surface.endFrame();
+    EXPECT_TRUE(surface.image().isNull());
+    EXPECT_TRUE(prepared(2500, 1, 0));
+    EXPECT_FALSE(surface.setBackground(QImage(9, 9, QImage::Format_RGB32)));
 }

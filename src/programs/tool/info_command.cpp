@@ -144,8 +144,9 @@ const char* yesNo(bool flag) {
 void printSummary(const ToolDocument& document) {
     const ZephSimulation& simulation = *document.simulation;
     std::printf("%s%s\n", simulation.FilePath.c_str(), simulation.FileName.c_str());
-    std::printf("version %s, loaded whole: %s, checksum holds: %s\n", simulation.zephSaveFileVersion.c_str(),
-                yesNo(document.loaded), yesNo(!simulation.ChecksumMismatch));
+    std::printf("version %s, loaded whole: %s, checksum mismatch: %s\n",
+                simulation.zephSaveFileVersion.empty() ? "unknown" : simulation.zephSaveFileVersion.c_str(),
+                yesNo(document.loaded), yesNo(simulation.ChecksumMismatch));
     std::printf("canvas %d x %d pixels, background %s at %d %%\n", widthPixels(simulation.Background),
                 heightPixels(simulation.Background),
                 simulation.Background.PicFileName.empty() ? "blank" : simulation.Background.PicFileName.c_str(),

@@ -14,7 +14,7 @@ QJsonObject slotJson(const ZephRenderSlot& slot) {
 
 QJsonObject entryJson(const ZephRenderData& entry, const ZephRenderTables& tables) {
     QJsonArray levels;
-    for (int level = 1; level <= kLevels; ++level) {
+    for (int level = 0; level <= kLevels; ++level) {
         if (entry.LevelUsed >> level & 1) levels.append(level);
     }
     QJsonArray slotList;

@@ -16,6 +16,8 @@ std::unique_ptr<ToolDocument> loadToolDocument(const std::string& file) {
     ZephSimulation& simulation = *document->simulation;
     simulation.FilePath = ZephPathFromFullPath(full);
     simulation.FileName = ZephNameFromFullPath(full);
+    // As the window does before every load, so that a file that cannot be read leaves an empty document.
+    ZephGlobalReset(false, simulation, document->watcher);
     const EditorFileContext context{document->settings, document->paths, document->host, document->failures,
                                     document->watcher};
     document->loaded = ZephLoadVisualizerXML(true, context, simulation);

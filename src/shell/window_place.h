@@ -1,0 +1,14 @@
+// The place of the main window between two runs. The settings hold it in twips, the window has it in pixels.
+#pragma once
+
+#include "model/settings.h"
+
+#include <QRect>
+
+// Where the window is to stand, in pixels. available: the part of the screens that windows may cover; a window that
+// would lie outside it, since a screen has gone, is moved and shrunk into it.
+QRect ZephWindowPlace(const ZephSettings& settings, const QRect& available);
+
+// Keeps the place for the next run. place: of the window when it is neither maximised nor minimised, pixels.
+// state: 0 normal, 1 minimised, 2 maximised.
+void ZephKeepWindowPlace(const QRect& place, int state, ZephSettings& settings);

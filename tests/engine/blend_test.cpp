@@ -1,0 +1,122 @@
+#include "engine/blend.h"
+#include "util/random_source.h"
+
+#include <gtest/gtest.h>
+
+#include <cmath>
+#include <vector>
+
+namespace {
+
+constexpr std::int32_t kWidth = 160;
+constexpr std::int32_t kHeight = 140;
+
+BulbMask randomMask(std::int32_t size, bool soft, SeededRandom& random) {
+    BulbMask mask;
+    mask.Size = size;
+    mask.Soft = soft;
+    const std::int32_t side = 2 * size;
+    mask.Stride = !soft && size <= 2 ? 4 : (side + 7) / 8 * 8;
+    mask.Coverage.resize(static_cast<std::size_t>(side * side));
+    if (!soft) mask.Lanes.assign(static_cast<std::size_t>(side * mask.Stride), 0);
+    for (std::int32_t y = 0; y < side; ++y) {
+        mask.Blocks.push_back({0, static_cast<std::uint8_t>((side + 7) / 8)});
+        for (std::int32_t x = 0; x < side; ++x) {
+            // Soft rows mirror each other, as those of floods do.
+            const auto mirror = static_cast<std::size_t>((side - 1 - y) * side + x);
+            std::uint8_t& coverage = mask.Coverage[static_cast<std::size_t>(y * side + x)];
+            coverage = static_cast<std::uint8_t>(soft ? ZephReturnRandomNumber(0, 255, random)
+                                                      : 255 * ZephReturnRandomNumber(0, 1, random));
+            if (soft && y >= size) coverage = mask.Coverage[mirror];
+            if (!soft && coverage != 0) mask.Lanes[static_cast<std::size_t>(y * mask.Stride + x)] = 0xFFFFFFFFU;
+        }
+    }
+    return mask;
+}
+
+}  // namespace
+
+TEST(BlendPixel, RoundsTheExactResultOnce) {
+    // Every source, coverage and alpha in steps of 5 and 17, over three destinations; the formula in real numbers. No
+    // tie can occur, since 65025 is odd.
+    for (std::uint32_t alpha = 0; alpha <= 255; alpha += 5) {
+        for (std::uint32_t coverage = 0; coverage <= 255; coverage += 17) {
+            for (std::uint32_t color = 0; color <= 255; color += 17) {
+                const std::uint32_t source = coveredPixel(0xFF000000U | color << 16 | (255 - color), coverage);
+                for (const std::uint32_t d : {0U, 101U, 255U}) {
+                    const std::uint32_t result = blendPixelReference(source, 0xFF000000U | d << 16 | d, alpha);
+                    const double keep = 1 - coverage * alpha / 65025.0;
+                    EXPECT_EQ(result >> 16 & 255,
+                              std::lround((source >> 16 & 255) * alpha / 255.0 + d * keep));  // NOLINT
+                    EXPECT_EQ(result >> 24, 255U);
+                }
+            }
+        }
+    }
+    EXPECT_EQ(coveredPixel(0xFFFF8001U, 128), 0x80804000U);  // 128 x 128 / 255 = 64.25, 1 x 128 / 255 = 0.5
+}
+
+TEST(BlendKernels, AllFormsGiveThePixelsOfTheReference) {
+    SeededRandom random(11);
+    for (std::int32_t round = 0; round < 600; ++round) {
+        const bool soft = round % 3 == 0;
+        const BulbMask mask = randomMask(ZephReturnRandomNumber(1, soft ? 64 : 16, random), soft, random);
+        BulbImage image;
+        makeBulbImage(&mask, ZephReturnRandomNumber(0, kWhite, random), image);
+        const BulbSprite sprite = spriteOf(image);
+        const std::int32_t kind = ZephReturnRandomNumber(1, 4, random);
+        const auto alpha = static_cast<std::uint8_t>(kind == 1   ? 255
+                                                     : kind == 2 ? ZephReturnRandomNumber(1, 3, random)
+                                                                 : ZephReturnRandomNumber(0, 255, random));
+        std::vector<BulbItem> items;
+        for (int n = 0; n < 3; ++n) {
+            items.push_back({{static_cast<std::int16_t>(ZephReturnRandomNumber(0, kWidth - 134, random)),
+                              static_cast<std::int16_t>(ZephReturnRandomNumber(-20, kHeight - 1, random))},
+                             0,
+                             0});
+        }
+        std::vector<std::uint32_t> before(kWidth * kHeight);
+        for (std::uint32_t& pixel : before)
+            pixel = 0xFF000000U | ZephReturnRandomNumber(0, kWhite, random);
+        const RowRange rows{ZephReturnRandomNumber(0, 60, random), ZephReturnRandomNumber(61, kHeight, random)};
+
+        const auto blended = [&](BlendForm form) {
+            std::vector<std::uint32_t> pixels = before;
+            blendKernels(form).blendItems(items, &alpha, &sprite, rows, {pixels.data(), kWidth});
+            return pixels;
+        };
+        const std::vector<std::uint32_t> expected = blended(BlendForm::Reference);
+        ASSERT_EQ(blended(BlendForm::Portable), expected) << "size " << mask.Size << " soft " << soft;
+        if (blendFormAvailable(BlendForm::Avx2)) {
+            ASSERT_EQ(blended(BlendForm::Avx2), expected) << "size " << mask.Size << " soft " << soft;
+        }
+    }
+}
+
+TEST(BlendClipped, DrawsWhatLiesOnTheCanvasAndNothingElse) {
+    SeededRandom random(12);
+    const BulbMask mask = randomMask(5, false, random);
+    BulbImage image;
+    makeBulbImage(&mask, 0x3366CC, image);
+    // A canvas of 20 x 12 within a frame of other pixels, which must stay.
+    std::vector<std::uint32_t> pixels(40 * 30, 0xFF112233U);
+    const Canvas canvas{{pixels.data() + 9 * 40 + 10, 40}, 20, 12};
+    for (const std::int64_t x : {std::int64_t{-9}, std::int64_t{15}, std::int64_t{1} << 31, -(std::int64_t{1} << 31)}) {
+        blendClipped(spriteOf(image), 255, x, -3, canvas);
+    }
+    for (int y = 0; y < 30; ++y) {
+        for (int x = 0; x < 40; ++x) {
+            const int canvasX = x - 10;
+            const int canvasY = y - 9;
+            const bool inside = canvasX >= 0 && canvasX < 20 && canvasY >= 0 && canvasY < 12;
+            const auto covers = [&](int left) {
+                const int column = canvasX - left;
+                const int row = canvasY + 3;
+                return inside && column >= 0 && column < 10 && row < 10 &&
+                       mask.Coverage[static_cast<std::size_t>(row * 10 + column)] == 255;
+            };
+            const std::uint32_t expected = covers(-9) || covers(15) ? 0xFFCC6633U : 0xFF112233U;
+            ASSERT_EQ(pixels[static_cast<std::size_t>(y * 40 + x)], expected) << canvasX << " " << canvasY;
+        }
+    }
+}
