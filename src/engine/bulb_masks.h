@@ -2,6 +2,7 @@
 // start-up, before any bulb image, and kept for the program's life: images point at them.
 #pragma once
 
+#include "engine/gl_shapes.h"
 #include "model/tables.h"
 #include "util/one_based.h"
 
@@ -34,13 +35,14 @@ struct BulbMask {
 struct ZephMasks {
     OneBased<OneBased<BulbMask, kBulbShapes>, kMaxBulbSize> ZephBulbMasks;  // [size][shape]
     OneBased<BulbMask, kMaxFloodSize> ZephFloodMasks;                       // [size]
+    ZephGLShapes GLShapes;                                                  // what OpenGL draws in place of masks
 };
 
 // Shown on the start-up screen as the work goes on.
 using MaskProgress = std::function<void(std::string_view)>;
 using DimmingCurveBytes = std::array<std::uint8_t, 256>;
 
-// All masks. The curve shapes the glow of floods and must be read before.
+// All masks, and the shapes for OpenGL. The curve shapes the glow of floods and must be read before.
 void ZephSetUpMasks(const DimmingCurveBytes& curve, const MaskProgress& progress, ZephMasks& masks);
 void SetUpNormalMasks(const MaskProgress& progress, ZephMasks& masks);
 void SetUpFloodMasks(const DimmingCurveBytes& curve, const MaskProgress& progress, ZephMasks& masks);

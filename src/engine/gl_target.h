@@ -1,0 +1,12 @@
+// Where OpenGL draws to: a window, or a picture without one. Owns the context.
+#pragma once
+
+#include "engine/gl_api.h"
+
+class GLTarget {
+public:
+    virtual ~GLTarget() = default;
+    virtual bool makeCurrent() = 0;  // false: the context is lost, or its window is not there
+    virtual GLProcedure resolve(const char* name) = 0;
+    virtual void swapBuffers() = 0;  // what was drawn is to be seen
+};
