@@ -15,6 +15,7 @@ public:
     GLOffscreen(const GLOffscreen&) = delete;
     GLOffscreen& operator=(const GLOffscreen&) = delete;
 
+    bool isSeen() const override { return true; }
     bool makeCurrent() override;
     GLProcedure resolve(const char* name) override;
     void swapBuffers() override;  // waits until everything is drawn

@@ -6,7 +6,8 @@
 class GLTarget {
 public:
     virtual ~GLTarget() = default;
-    virtual bool makeCurrent() = 0;  // false: the context is lost, or its window is not there
+    virtual bool isSeen() const = 0;  // false: frames need not be drawn, as nobody could see them
+    virtual bool makeCurrent() = 0;   // false: the context is lost, or its window is closed
     virtual GLProcedure resolve(const char* name) = 0;
     virtual void swapBuffers() = 0;  // what was drawn is to be seen
 };

@@ -84,8 +84,9 @@ void OpenGLSurface::beginFrame() {
     if (document_ == nullptr) return;
     forgetNoted();
     begun_ = false;
-    current_ = target_->makeCurrent();
-    if (current_ || lostTold_) return;
+    const bool seen = target_->isSeen();
+    current_ = seen && target_->makeCurrent();
+    if (!seen || current_ || lostTold_) return;
     lostTold_ = true;  // it would be told in every frame
     failures_->ErrReport("The OpenGL context was lost", procedureName(kModule, "ZephGLBeginFrame"), 0);
 }

@@ -66,7 +66,7 @@ private:
     GLPlan plan_;  // without what lies on the GPU
     GLWork work_;
 
-    std::size_t mostListed_ = 0;  // bulbs in one upload
+    std::size_t mostListed_ = 0;          // bulbs in one upload
     bool current_ = false;                // the frame under way can be drawn
     bool lostTold_ = false;               // a lost context is reported once
     bool begun_ = false;                  // the background is painted

@@ -229,6 +229,7 @@ TEST(OpenGLSurface, KeepsOneUnitOnePixelInAWindowOfAnotherSize) {
 
 TEST(OpenGLSurface, TellsWhyItCannotStart) {
     struct DeadTarget : GLTarget {
+        bool isSeen() const override { return true; }
         bool makeCurrent() override { return works; }
         GLProcedure resolve(const char*) override { return nullptr; }
         void swapBuffers() override { FAIL(); }
