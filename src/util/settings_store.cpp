@@ -37,6 +37,11 @@ std::string statusText(QSettings::Status status, const QString& file) {
 
 FileSettingsStore::FileSettingsStore(const std::string& file)
     : file_(text(file), QSettings::IniFormat), problem_(statusText(file_.status(), text(file))) {
+    readSpelling();
+}
+
+void FileSettingsStore::readSpelling() {
+    spelling_.clear();
     for (const QString& name : file_.allKeys())
         spelling_.insert_or_assign(name.toLower(), name);
 }
@@ -76,5 +81,6 @@ void FileSettingsStore::removeKey(std::string_view key) {
 
 bool FileSettingsStore::flush() {
     file_.sync();
+    readSpelling();  // another process may have written names of its own
     return file_.status() == QSettings::NoError;
 }
