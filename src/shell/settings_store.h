@@ -17,7 +17,7 @@ class SettingsStore {
 public:
     virtual ~SettingsStore() = default;
 
-    // Nothing where there is no such value. Throws Failure where it is no text.
+    // Nothing where there is no such value.
     virtual std::optional<std::string> value(std::string_view key, std::string_view name) const = 0;
     virtual void setValue(std::string_view key, std::string_view name, std::string_view text) = 0;
     // Removes the key with all its values.
@@ -28,8 +28,8 @@ public:
     virtual std::string problem() const = 0;
 };
 
-// An INI file with one section a key; see docs/files.md. Written whole, under a lock, so that two processes may share
-// it: each changes only the values that it set.
+// An INI file with one section a key; see docs/files.md. QSettings writes it whole, under a lock, so that two processes
+// may share it: each changes only the values that it set.
 class FileSettingsStore : public SettingsStore {
 public:
     // file: full path; neither it nor its folder need exist.
