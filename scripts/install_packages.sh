@@ -38,7 +38,7 @@ install_packages() {
 }
 
 # What building and running takes.
-BUILD_PACKAGES=(g++ cmake ninja-build ccache pkg-config qt6-base-dev libpugixml-dev libgtest-dev libgmock-dev
+BUILD_PACKAGES=(g++ cmake ninja-build ccache pkg-config qt6-base-dev qt6-svg-dev libpugixml-dev libgtest-dev libgmock-dev
     libpixman-1-dev)
 # What looking at the result takes besides: the platform plugin's own needs come with qt6-base-dev.
 RUN_PACKAGES=(ffmpeg)

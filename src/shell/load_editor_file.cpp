@@ -1,6 +1,7 @@
 #include "shell/load_editor_file.h"
 
 #include "editor/background.h"
+#include "editor/editor_watcher.h"
 #include "model/editor_loader.h"
 #include "shell/startup.h"
 #include "util/text.h"
@@ -16,14 +17,14 @@ void setEditorFile(std::string_view path, ZephSimulation& simulation) {
 
 bool LoadEditorFile(bool quiet, Program& program, SimulationFace& face, FileFace& window) try {
     ZephSimulation& simulation = *program.simulation;
-    ZephGlobalReset(false, simulation, program.seams.watcher);
+    EditorStateWatcher watcher(program.editor);
+    ZephGlobalReset(false, simulation, watcher);
     program.picBackground = QImage();
     face.redrawObjects();
     window.showDocument();
     program.seams.host.pumpEvents();
 
-    const EditorFileContext context{program.settings, program.paths, program.seams.host, program.failures,
-                                    program.seams.watcher};
+    const EditorFileContext context{program.settings, program.paths, program.seams.host, program.failures, watcher};
     if (!ZephLoadVisualizerXML(!quiet, context, simulation)) return false;
     ZephRebuildStaticFixtureBulbs(simulation, *program.masks, *program.bulbs);
     simulation.SimulationOpen = true;

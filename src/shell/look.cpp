@@ -3,89 +3,110 @@
 #include <QApplication>
 #include <QPainter>
 #include <QPalette>
+#include <QProxyStyle>
 #include <QStyleFactory>
 
 namespace {
 
-const QColor kAccent(232, 163, 61);
+struct Tones {
+    QColor window, text, faint, base, alternate, button, dark, mid, light, tipBase, tipText, accent, onAccent;
+};
 
-// Draws on a field of 24 x 24.
-template <typename Draw>
-QIcon drawnIcon(Draw&& draw) {
+// Neutral greys: a tint around the canvas would be seen as a tint of the lights.
+const Tones kDarkTones{{43, 45, 48},    {228, 229, 232}, {122, 124, 130}, {28, 29, 32}, {34, 35, 38},
+                       {58, 60, 64},    {22, 23, 25},    {74, 76, 82},    {88, 90, 96}, {24, 25, 28},
+                       {236, 237, 240}, {232, 163, 61},  {24, 20, 12}};
+const Tones kLightTones{{240, 240, 241}, {32, 33, 36},    {150, 152, 157}, {255, 255, 255}, {246, 246, 247},
+                        {228, 229, 231}, {203, 204, 208}, {176, 178, 183}, {255, 255, 255}, {255, 255, 255},
+                        {32, 33, 36},    {201, 124, 18},  {255, 255, 255}};
+
+// Disabled text without the bright edge below it, which on a dark ground is brighter than the text.
+class PlainDisabledText : public QProxyStyle {
+public:
+    using QProxyStyle::QProxyStyle;
+    int styleHint(StyleHint hint, const QStyleOption* option, const QWidget* widget,
+                  QStyleHintReturn* returned) const override {
+        if (hint == SH_EtchDisabledText) return 0;
+        return QProxyStyle::styleHint(hint, option, widget, returned);
+    }
+};
+
+QPalette paletteOf(const Tones& tones) {
+    QPalette palette;
+    palette.setColor(QPalette::Window, tones.window);
+    palette.setColor(QPalette::WindowText, tones.text);
+    palette.setColor(QPalette::Base, tones.base);
+    palette.setColor(QPalette::AlternateBase, tones.alternate);
+    palette.setColor(QPalette::Text, tones.text);
+    palette.setColor(QPalette::PlaceholderText, tones.faint);
+    palette.setColor(QPalette::Button, tones.button);
+    palette.setColor(QPalette::ButtonText, tones.text);
+    palette.setColor(QPalette::ToolTipBase, tones.tipBase);
+    palette.setColor(QPalette::ToolTipText, tones.tipText);
+    palette.setColor(QPalette::Highlight, tones.accent);
+    palette.setColor(QPalette::HighlightedText, tones.onAccent);
+    palette.setColor(QPalette::Link, tones.accent);
+    palette.setColor(QPalette::Dark, tones.dark);
+    palette.setColor(QPalette::Mid, tones.mid);
+    palette.setColor(QPalette::Midlight, tones.light);
+    // A style sheet on a menu takes the etched text from this colour, past the style's own hint.
+    palette.setColor(QPalette::Disabled, QPalette::Light, tones.base);
+    for (const QPalette::ColorRole role : {QPalette::WindowText, QPalette::Text, QPalette::ButtonText}) {
+        palette.setColor(QPalette::Disabled, role, tones.faint);
+    }
+    return palette;
+}
+
+// Flat buttons that show their state by their ground; %1 text with little weight, %2 the accent, %3 border.
+QString styleSheetOf(const Tones& tones) {
+    return QString("QToolTip { border: 1px solid %3; padding: 4px; }"
+                   "QStatusBar::item { border: none; }"
+                   "QStatusBar QLabel { padding: 2px 8px; }"
+                   "QStatusBar #StatusBar1Panel2, #StatusBar1Panel3, #StatusBar1Panel4 { border-left: 1px solid %3; }"
+                   "QToolBar { border: none; spacing: 1px; padding: 0px; }"
+                   "QToolBar::separator { background: %3; width: 1px; margin: 4px 4px; }"
+                   "QToolButton { border: 1px solid transparent; border-radius: 5px; padding: 2px; }"
+                   "QToolButton:hover:enabled { background: rgba(%1, 28); }"
+                   "QToolButton:pressed:enabled { background: rgba(%1, 52); }"
+                   "QToolButton:checked { background: rgba(%2, 70); border-color: rgb(%2); }"
+                   "QToolButton:checked:disabled { background: rgba(%2, 30); border-color: rgba(%2, 90); }"
+                   "QMenuBar { padding: 2px 4px; }"
+                   "QMenu { border: 1px solid %3; padding: 3px; }"
+                   "QMenu::separator { height: 1px; background: %3; margin: 4px 8px; }"
+                   "QSplitter::handle { background: transparent; width: 6px; }"
+                   "QGroupBox { background: rgba(0, 0, 0, 28); border: 1px solid %3;"
+                   " border-radius: 5px; margin-top: 1.5em; padding: 4px 2px 2px 2px; }"
+                   "QGroupBox::title { subcontrol-origin: margin; left: 2px; color: rgb(%2); }"
+                   "QGroupBox::title:disabled { color: %3; }")
+        .arg(QString("%1, %2, %3").arg(tones.text.red()).arg(tones.text.green()).arg(tones.text.blue()),
+             QString("%1, %2, %3").arg(tones.accent.red()).arg(tones.accent.green()).arg(tones.accent.blue()),
+             tones.mid.name());
+}
+
+}  // namespace
+
+QIcon simulationIcon() {
     QIcon icon;
-    for (const int scale : {1, 2}) {
-        QPixmap pixmap(24 * scale, 24 * scale);
+    for (const int pixels : {24, 48, 96}) {
+        QPixmap pixmap(pixels, pixels);
         pixmap.fill(Qt::transparent);
         QPainter painter(&pixmap);
         painter.setRenderHint(QPainter::Antialiasing);
-        painter.scale(scale, scale);
+        painter.scale(pixels / 24.0, pixels / 24.0);
         painter.setPen(Qt::NoPen);
-        draw(painter);
+        painter.setBrush(QColor(255, 226, 150, 60));
+        painter.drawEllipse(QPointF(12, 12), 11, 11);
+        painter.setBrush(kDarkTones.accent);
+        painter.drawPolygon(QPolygonF{{QPointF(8, 5), QPointF(19.5, 12), QPointF(8, 19)}});
         painter.end();
         icon.addPixmap(pixmap);
     }
     return icon;
 }
 
-}  // namespace
-
-QIcon openIcon() {
-    return drawnIcon([](QPainter& painter) {
-        painter.setBrush(QColor(168, 122, 52));
-        painter.drawRoundedRect(QRectF(3, 5, 9, 6), 1.5, 1.5);
-        painter.drawRoundedRect(QRectF(3, 7, 17, 12), 1.5, 1.5);
-        painter.setBrush(QColor(240, 196, 108));
-        painter.drawPolygon(QPolygonF{{QPointF(6, 11), QPointF(23, 11), QPointF(19.5, 19.5), QPointF(3, 19.5)}});
-    });
-}
-
-QIcon simulationIcon() {
-    return drawnIcon([](QPainter& painter) {
-        painter.setBrush(QColor(255, 226, 150, 60));
-        painter.drawEllipse(QPointF(12, 12), 11, 11);
-        painter.setBrush(kAccent);
-        painter.drawPolygon(QPolygonF{{QPointF(8, 5), QPointF(19.5, 12), QPointF(8, 19)}});
-    });
-}
-
-QIcon stopIcon() {
-    return drawnIcon([](QPainter& painter) {
-        painter.setBrush(QColor(226, 92, 74));
-        painter.drawRoundedRect(QRectF(5, 5, 14, 14), 2, 2);
-    });
-}
-
 void applyLook(QApplication& application) {
-    application.setStyle(QStyleFactory::create("Fusion"));
-    const QColor ground(43, 45, 52);
-    const QColor text(226, 228, 234);
-    const QColor faint(124, 128, 140);
-    QPalette palette;
-    palette.setColor(QPalette::Window, ground);
-    palette.setColor(QPalette::WindowText, text);
-    palette.setColor(QPalette::Base, QColor(30, 32, 38));
-    palette.setColor(QPalette::AlternateBase, QColor(36, 38, 45));
-    palette.setColor(QPalette::Text, text);
-    palette.setColor(QPalette::PlaceholderText, faint);
-    palette.setColor(QPalette::Button, QColor(56, 59, 68));
-    palette.setColor(QPalette::ButtonText, text);
-    palette.setColor(QPalette::ToolTipBase, QColor(250, 240, 214));
-    palette.setColor(QPalette::ToolTipText, QColor(40, 34, 24));
-    palette.setColor(QPalette::Highlight, kAccent);
-    palette.setColor(QPalette::HighlightedText, QColor(24, 20, 12));
-    palette.setColor(QPalette::Link, kAccent);
-    palette.setColor(QPalette::Dark, QColor(23, 24, 29));
-    for (const QPalette::ColorRole role : {QPalette::WindowText, QPalette::Text, QPalette::ButtonText}) {
-        palette.setColor(QPalette::Disabled, role, faint);
-    }
-    application.setPalette(palette);
-    application.setStyleSheet("QToolTip { border: 1px solid #b08a4a; padding: 3px; }"
-                              "QStatusBar::item { border: none; }"
-                              "QStatusBar QLabel { padding: 2px 8px; }"
-                              "QToolBar { border: none; spacing: 4px; padding: 3px 6px; }"
-                              "QMenuBar { padding: 2px 4px; }"
-                              "QGroupBox { background: rgba(0, 0, 0, 28); border: 1px solid #3a3d46;"
-                              " border-radius: 5px; margin-top: 1.5em; padding: 4px 2px 2px 2px; }"
-                              "QGroupBox::title { subcontrol-origin: margin; left: 2px; color: #e8b768; }"
-                              "QGroupBox::title:disabled { color: #7c808c; }");
+    const Tones& tones = qEnvironmentVariable("ZEPH_LOOK") == "light" ? kLightTones : kDarkTones;
+    application.setStyle(new PlainDisabledText(QStyleFactory::create("Fusion")));
+    application.setPalette(paletteOf(tones));
+    application.setStyleSheet(styleSheetOf(tones));
 }

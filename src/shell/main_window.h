@@ -2,22 +2,21 @@
 // to be done is decided by the procedures that its events call.
 #pragma once
 
+#include "editor/mode_commands.h"
+#include "shell/command_actions.h"
+#include "shell/command_icons.h"
 #include "shell/load_editor_file.h"
-#include "shell/picture_box.h"
+#include "shell/object_panel.h"
+#include "shell/status_row.h"
+#include "shell/tool_bars.h"
+#include "shell/viewport.h"
 #include "shell/window_host.h"
+#include "shell/window_keys.h"
 
 #include <QMainWindow>
 #include <QTimer>
 
-#include <array>
-
-class QAction;
-class QLabel;
-class QMenu;
-class QProgressBar;
-class QPushButton;
-class QScrollArea;
-class QToolBar;
+class QSplitter;
 
 class frmZephMain : public QMainWindow, private SimulationFace, private FileFace {
 public:
@@ -34,54 +33,73 @@ protected:
     bool eventFilter(QObject* watched, QEvent* event) override;
 
 private:
-    // Events
+    // Commands
+    void runCommand(Command command);
     void mnuFileLoad_Click();
+    void mnuRecentFiles_Click(int index);
     void mnuFileExit_Click();
     void mnuHelpAbout_Click();
     void cmdStop_MouseUp();
+    void sldIntensity_Scroll();
+    void tmrAdjustBrightness_Timer();
     void tick();
     void dataArrived();
 
+    // ModeFace
+    void restoreIfMinimized() override;
+    void eraseRubberBand() override;
+    void setCanvasPointer(CanvasPointer pointer) override;
+    void redrawObjects() override;
+    void ZephHighlightflg(std::int32_t object) override;
+    void ZephDeselectflg() override;
+    void ZephLoadUIObjectList() override;
+    void showPressedDrawButton() override;
+    void showModeButtons() override;
+    void CheckEnable(bool forceEnable) override;
     // SimulationFace
     void setTimer(bool on, int intervalMs) override;
     void showQueueGauge(bool shown) override;
     void showFrames(const QImage& frame) override;
-    void redrawObjects() override;
     void SetControlsForSimulation(bool on) override;
     void layOutForEditor() override;
-    void CheckEnable() override;
     // FileFace
     void showDocument() override;
     void setTitle(std::string_view windowTitle) override;
 
-    void showQueueLength(const QueueGaugeUpdate& update);
-
-    void buildMenus();
-    void buildToolBar();
-    void buildCanvas();
-    void buildStatusBar();
+    void build();
+    void connectControls();
     void placeAtStart();
+    void showEditorControls(bool shown);
+    void UpdateRecentFileMenu();
+    // Asks before unsaved work is given up. True: go on.
+    bool mayLoad(std::string_view titleSuffix);
+    // A key that went down in this form. True where it is swallowed.
+    bool keyDown(const QKeyEvent& event);
+    KeyAnswer answerTo(const QKeyEvent& event) const;
+    void carryOut(const KeyAnswer& answer);
+    void moveListRow(bool backward);
+    void showContextMenu(const QPoint& globalPos);
     // Ends the simulation now, or behind the tick that is under way.
     void requestEnd();
-    void toggleSimulation();
 
     Program& program_;
     WindowHost& host_;
+    ProgramModes modes_{program_, *this};
+    WindowKeys keys_;
+    CommandStates states_;
+    EditToolBarTexts texts_;
 
-    QMenu* mnufile_ = nullptr;
-    QAction* mnuFileLoad_ = nullptr;
-    QAction* mnuFileExit_ = nullptr;
-    QMenu* mnuEdit_ = nullptr;
-    QAction* mnuSimulationMode_ = nullptr;
-    QMenu* mnuHelp_ = nullptr;
-    QToolBar* CoolBar1_ = nullptr;
-    QScrollArea* picViewport_ = nullptr;
-    PictureBox* picMain_ = nullptr;
-    std::array<QLabel*, 5> panels_{};  // 1..4
-    QPushButton* cmdStop_ = nullptr;
-    QProgressBar* prbQueueLen_ = nullptr;
+    std::unique_ptr<CommandActions> commands_;
+    CoolBar* CoolBar1_ = nullptr;
+    QSplitter* splitter_ = nullptr;
+    ObjectPanel* objects_ = nullptr;
+    CanvasViewport* canvas_ = nullptr;
+    StatusRow* StatusBar1_ = nullptr;
     QTimer hrTimer1_;
+    QTimer tmrAdjustBrightness_;
+    int lastIntensity_ = 500;  // of sldIntensity at the timer's last tick; the first tick always sees a move
 
+    bool movingList_ = false;      // the re-entry flag of the keyboard: Tab is moving the list
     bool inTick_ = false;          // a tick that arrives meanwhile does nothing
     bool endRequested_ = false;    // end the simulation once the tick under way is done
     bool closeRequested_ = false;  // and close the window then

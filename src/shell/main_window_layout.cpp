@@ -1,104 +1,57 @@
 // The main window's controls and their places: building them, and changing between the two faces.
-#include "shell/look.h"
 #include "shell/main_window.h"
-#include "shell/startup.h"
-#include "util/color.h"
 #include "util/units.h"
 
-#include <QAction>
 #include <QGuiApplication>
-#include <QLabel>
 #include <QLayout>
 #include <QMenuBar>
-#include <QMessageBox>
-#include <QProgressBar>
-#include <QPushButton>
 #include <QScreen>
-#include <QScrollArea>
-#include <QScrollBar>
-#include <QStatusBar>
-#include <QToolBar>
+#include <QSplitter>
+#include <QVBoxLayout>
 
 namespace {
 
 constexpr int kLeastWidthTwips = 3100;  // of the client area
 constexpr int kLeastHeightTwips = 3430;
+constexpr int kListPixels = 220;
 
 }  // namespace
 
-void frmZephMain::buildMenus() {
-    mnufile_ = menuBar()->addMenu(tr("&File"));
-    mnufile_->setObjectName("mnufile");
-    mnuFileLoad_ = mnufile_->addAction(openIcon(), tr("&Open..."), this, &frmZephMain::mnuFileLoad_Click);
-    mnuFileLoad_->setObjectName("mnuFileLoad");
-    mnuFileLoad_->setShortcut(QKeySequence::Open);
-    mnufile_->addSeparator();
-    mnuFileExit_ = mnufile_->addAction(tr("E&xit"), this, &frmZephMain::mnuFileExit_Click);
-    mnuFileExit_->setObjectName("mnuFileExit");
-
-    mnuEdit_ = menuBar()->addMenu(tr("&Edit"));
-    mnuEdit_->setObjectName("mnuEdit");
-    mnuSimulationMode_ =
-        mnuEdit_->addAction(simulationIcon(), tr("&Simulation Mode"), this, &frmZephMain::toggleSimulation);
-    mnuSimulationMode_->setObjectName("mnuSimulationMode");
-    mnuSimulationMode_->setShortcut(Qt::Key_F5);
-
-    mnuHelp_ = menuBar()->addMenu(tr("&Help"));
-    mnuHelp_->setObjectName("mnuHelp");
-    mnuHelp_->addAction(tr("&About..."), this, &frmZephMain::mnuHelpAbout_Click)->setObjectName("mnuHelpAbout");
+void frmZephMain::build() {
+    commands_ = std::make_unique<CommandActions>(
+        *this, *menuBar(), [this](Command command) { runCommand(command); },
+        [this](int index) { mnuRecentFiles_Click(index); });
+    auto* client = new QWidget(this);
+    CoolBar1_ = new CoolBar(*commands_, client);
+    splitter_ = new QSplitter(Qt::Horizontal, client);
+    objects_ = new ObjectPanel(splitter_);
+    canvas_ = new CanvasViewport(splitter_);
+    splitter_->setChildrenCollapsible(false);
+    splitter_->setStretchFactor(1, 1);
+    splitter_->setSizes({kListPixels, 10 * kListPixels});
+    auto* rows = new QVBoxLayout(client);
+    rows->setContentsMargins(0, 0, 0, 0);
+    rows->setSpacing(0);
+    rows->addWidget(CoolBar1_);
+    rows->addWidget(splitter_, 1);
+    setCentralWidget(client);
+    StatusBar1_ = new StatusRow(this);
+    setStatusBar(StatusBar1_);
+    setContextMenuPolicy(Qt::NoContextMenu);
 }
 
-void frmZephMain::mnuHelpAbout_Click() {
-    const QString name = QString::fromStdString(ZephWindowTitle("")).trimmed();
-    QMessageBox::about(this, name, name + tr("\nPlans a light display and previews it under its live channel stream."));
-}
-
-void frmZephMain::buildToolBar() {
-    CoolBar1_ = addToolBar(tr("Tools"));
-    CoolBar1_->setObjectName("CoolBar1");
-    CoolBar1_->setMovable(false);
-    CoolBar1_->setToolButtonStyle(Qt::ToolButtonTextBesideIcon);
-    CoolBar1_->addAction(mnuFileLoad_);
-    CoolBar1_->addSeparator();
-    CoolBar1_->addAction(mnuSimulationMode_);
-}
-
-void frmZephMain::buildCanvas() {
-    picViewport_ = new QScrollArea(this);
-    picViewport_->setObjectName("picViewport");
-    picViewport_->setAlignment(Qt::AlignCenter);
-    picViewport_->setBackgroundRole(QPalette::Dark);
-    picViewport_->horizontalScrollBar()->setObjectName("HScroll1");
-    picViewport_->verticalScrollBar()->setObjectName("VScroll1");
-    picMain_ = new PictureBox;
-    picMain_->setObjectName("picMain");
-    picViewport_->setWidget(picMain_);
-    setCentralWidget(picViewport_);
-}
-
-void frmZephMain::buildStatusBar() {
-    statusBar()->setObjectName("StatusBar1");
-    constexpr std::array<int, 5> kStretch{0, 2, 6, 3, 2};
-    for (std::size_t panel = 1; panel < panels_.size(); ++panel) {
-        panels_[panel] = new QLabel(this);
-        panels_[panel]->setObjectName(QString("StatusBar1Panel%1").arg(panel));
-        statusBar()->addWidget(panels_[panel], kStretch[panel]);
-    }
-    prbQueueLen_ = new QProgressBar(this);
-    prbQueueLen_->setObjectName("prbQueueLen");
-    prbQueueLen_->setRange(0, kQueueGaugeMax);
-    prbQueueLen_->setValue(0);
-    prbQueueLen_->setTextVisible(false);
-    prbQueueLen_->setFixedSize(140, 14);
-    prbQueueLen_->setToolTip(tr("Received text that waits to be worked off"));
-    cmdStop_ = new QPushButton(stopIcon(), tr("Stop"), this);
-    cmdStop_->setObjectName("cmdStop");
-    cmdStop_->setFocusPolicy(Qt::NoFocus);
-    connect(cmdStop_, &QPushButton::clicked, this, &frmZephMain::cmdStop_MouseUp);
-    statusBar()->addPermanentWidget(prbQueueLen_);
-    statusBar()->addPermanentWidget(cmdStop_);
-    prbQueueLen_->hide();
-    cmdStop_->hide();
+void frmZephMain::connectControls() {
+    StatusBar1_->cmdStop_MouseUp = [this] { cmdStop_MouseUp(); };
+    CoolBar1_->band().sldIntensity_Scroll = [this](int) { sldIntensity_Scroll(); };
+    objects_->flgObjectSelect_Click = [this](int row) {
+        flgObjectSelect_Click(objects_->objectOfRow(row), modes_.context());
+    };
+    objects_->chkCmdFixtureOrProp_MouseUp = [this](int button, bool left) {
+        chkCmdFixtureOrProp_MouseUp(button, left, modes_.context());
+    };
+    objects_->chkSimplePropMode_Click = [this](bool simple) { chkSimplePropMode_Click(simple, modes_.context()); };
+    connect(&canvas_->picMain(), &QWidget::customContextMenuRequested, this,
+            [this](const QPoint& pos) { showContextMenu(canvas_->picMain().mapToGlobal(pos)); });
 }
 
 void frmZephMain::placeAtStart() {
@@ -110,50 +63,39 @@ void frmZephMain::placeAtStart() {
 }
 
 void frmZephMain::showQueueGauge(bool shown) {
-    prbQueueLen_->setVisible(shown);
+    StatusBar1_->showQueueGauge(shown);
 }
 
-void frmZephMain::showQueueLength(const QueueGaugeUpdate& update) {
-    if (update.color) {
-        const ColorParts parts = ZephColorToRGB(*update.color);
-        const QColor color(parts.red, parts.green, parts.blue);
-        prbQueueLen_->setStyleSheet(QString("QProgressBar { border: 1px solid #101114; background: #1e2026; }"
-                                            "QProgressBar::chunk { background: %1; }")
-                                        .arg(color.name()));
-    }
-    if (update.value) prbQueueLen_->setValue(*update.value);
+void frmZephMain::showEditorControls(bool shown) {
+    menuBar()->setVisible(shown);
+    CoolBar1_->setVisible(shown);
+    objects_->setVisible(shown);
+    StatusBar1_->showSimulationButtons(!shown);
+    canvas_->setBorder(shown);
 }
 
 void frmZephMain::SetControlsForSimulation(bool on) {
     editorPlace_ = QRect(pos(), size());
     if (!on) return;
-    menuBar()->hide();
-    CoolBar1_->hide();
-    picViewport_->setFrameShape(QFrame::NoFrame);
-    cmdStop_->show();
-    if (isMaximized() || isFullScreen()) return;
-    // As large as the canvas, so that nothing stands around the lights; but no larger than the screen.
-    layout()->activate();
-    const QSize around = size() - picViewport_->size();
-    const QSize frame = frameGeometry().size() - size();
-    resize((picMain_->size() + around).boundedTo(screen()->availableGeometry().size() - frame));
+    showEditorControls(false);
+    if (!isMaximized() && !isFullScreen()) {
+        // As large as the canvas, so that nothing stands around the lights; but no larger than the screen.
+        layout()->activate();
+        centralWidget()->layout()->activate();
+        const QSize around(0, size().height() - centralWidget()->height());
+        const QSize frame = frameGeometry().size() - size();
+        const QSize canvas = canvas_->picMain().size();
+        resize((canvas + around).boundedTo(screen()->availableGeometry().size() - frame));
+    }
+    canvas_->setScrollUnit(ScrollUnit::Pixels);
 }
 
 void frmZephMain::layOutForEditor() {
-    menuBar()->show();
-    CoolBar1_->show();
-    picViewport_->setFrameShape(QFrame::StyledPanel);
-    cmdStop_->hide();
+    showEditorControls(true);
     if (editorPlace_.isValid() && !isMaximized() && !isFullScreen()) {
         move(editorPlace_.topLeft());
         resize(editorPlace_.size());
     }
     editorPlace_ = QRect();
-}
-
-void frmZephMain::CheckEnable() {
-    const ZephSimulation& simulation = *program_.simulation;
-    const bool editing = !program_.simulating();
-    mnuFileLoad_->setEnabled(editing);
-    mnuSimulationMode_->setEnabled(simulation.SimulationOpen && simulation.FixtureCount >= 1);
+    canvas_->setScrollUnit(ScrollUnit::Percent);
 }

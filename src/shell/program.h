@@ -2,6 +2,7 @@
 // handed parts of it by reference.
 #pragma once
 
+#include "editor/editor_state.h"
 #include "engine/bulb_images.h"
 #include "engine/light_commands.h"
 #include "engine/render_cycle.h"
@@ -19,10 +20,6 @@
 
 #include <memory>
 #include <string>
-
-// States of the window; see ZephSwitchMode.
-inline constexpr int kStateSimulation = 1;
-inline constexpr int kStateSelectFixture = 3;
 
 // What differs between the program and a test of it.
 struct ProgramSeams {
@@ -46,7 +43,7 @@ struct Program {
     ZephSettings settings;
     bool StartupLoading = false;
     int RenderEngine = kEngineStandard;
-    int ZephUIState = kStateSelectFixture;
+    ZephEditorState editor;
 
     std::unique_ptr<ZephSimulation> simulation = std::make_unique<ZephSimulation>();
     ZephDimmingCurve curve{};
@@ -68,5 +65,5 @@ struct Program {
     ParserSetup parser;
     ReceiveState receive;
 
-    bool simulating() const { return ZephUIState == kStateSimulation; }
+    bool simulating() const { return editor.ZephUIState == kStateSimulation; }
 };

@@ -40,7 +40,7 @@ bool startStandardEngine(Program& program, SimulationFace& face) {
     if (!program.surface.prepare(scene, program.failures)) return false;
 
     host.setStatusPanel(2, "Setting Emulation Timer Attributes...");
-    program.ZephUIState = kStateSimulation;
+    program.editor.ZephUIState = kStateSimulation;
     program.clocks = clocksAtEntry(program.seams.clock.timeGetTime());
     face.setTimer(true, kStandardTimerMs);
     face.showQueueGauge(true);
@@ -54,6 +54,11 @@ bool startStandardEngine(Program& program, SimulationFace& face) {
 
 void mnuSimulationMode_Click(Program& program, SimulationFace& face) {
     if (program.simulating()) return;
+    if (objectSelected(program.editor)) {
+        face.ZephDeselectflg();
+        program.editor.ZephSelection.Object = 0;
+        face.redrawObjects();
+    }
     if (program.seams.clock.timeGetTime() < 0) {
         refuseBackwardClock(program.seams.host);
         ZephSwitchMode(kStateSelectFixture, program, face);
@@ -61,29 +66,32 @@ void mnuSimulationMode_Click(Program& program, SimulationFace& face) {
         return;
     }
     ZephSwitchMode(kStateSimulation, program, face);
-    face.CheckEnable();
+    face.CheckEnable(false);
     if (program.simulating()) {
         face.SetControlsForSimulation(true);
     } else {
         face.layOutForEditor();
+        face.CheckEnable(false);
     }
 }
 
-void ZephSwitchMode(int newState, Program& program, SimulationFace& face) {
-    if (program.simulating()) ZephCleanUpAfterSimulation(program, face);
-    if (newState == kStateSimulation) {
-        clearLevelDumps(program.receive.Stream.Dumps);
-        program.receive.Stream.ZephStackBuffer.clear();  // only what arrives from now on counts
-        program.seams.host.setBusyPointer(true);
-        const bool started = startStandardEngine(program, face);
-        program.seams.host.setBusyPointer(false);
-        if (started) return;
-    }
-    face.setTimer(false, kStandardTimerMs);
-    program.ZephUIState = kStateSelectFixture;
-    ZephUpdateStatusBarForUIState(program);
-    face.redrawObjects();
-    face.CheckEnable();
+bool ProgramModes::enterSimulation() {
+    clearLevelDumps(program_.receive.Stream.Dumps);
+    program_.receive.Stream.ZephStackBuffer.clear();  // only what arrives from now on counts
+    program_.seams.host.setBusyPointer(true);
+    const bool started = startStandardEngine(program_, face_);
+    program_.seams.host.setBusyPointer(false);
+    if (!started) face_.stopTimer();
+    return started;
+}
+
+void ProgramModes::ZephCleanUpAfterSimulation() {
+    ::ZephCleanUpAfterSimulation(program_, face_);
+}
+
+void ZephSwitchMode(int requestedMode, Program& program, SimulationFace& face) {
+    ProgramModes modes(program, face);
+    ZephSwitchMode(requestedMode, program.editor.ZephDrawTool, modes.context());
 }
 
 void EndSimulation(Program& program, SimulationFace& face) {
@@ -115,10 +123,4 @@ void hrTimer1_Timer(const std::function<void()>& frameDone, Program& program, Si
                       program.clocks,      program.random, program.surface, program.failures};
     ZephRenderTick(program.RenderEngine, {program.seams.clock, program.parser, program.seams.host, program.sink,
                                           program.receive.Stream, run, frameDone});
-}
-
-void ZephUpdateStatusBarForUIState(Program& program) {
-    std::string_view text;
-    if (program.simulation->SimulationOpen) text = program.simulating() ? "Simulation Active" : "Select Fixture";
-    program.seams.host.setStatusPanel(2, text);
 }

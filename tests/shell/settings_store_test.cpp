@@ -1,7 +1,7 @@
-#include "shell/settings_store.h"
 #include "shell/settings_values.h"
 #include "tests/shell/settings_rig.h"
 #include "util/random_source.h"
+#include "util/settings_store.h"
 
 #include <QFile>
 #include <QTemporaryDir>

@@ -18,7 +18,15 @@ public:
     }
     void SetControlsForSimulation(bool on) override { simulationControls = on; }
     void layOutForEditor() override { simulationControls = false; }
-    void CheckEnable() override {}
+    void CheckEnable(bool) override {}
+    void restoreIfMinimized() override {}
+    void eraseRubberBand() override {}
+    void setCanvasPointer(CanvasPointer) override {}
+    void ZephHighlightflg(std::int32_t) override {}
+    void ZephDeselectflg() override {}
+    void ZephLoadUIObjectList() override {}
+    void showPressedDrawButton() override {}
+    void showModeButtons() override {}
     void showDocument() override {}
     void setTitle(std::string_view windowTitle) override { title = windowTitle; }
 
@@ -91,7 +99,7 @@ TEST_F(SimulationMode, LeavesAndComesBackOnTheSameSocket) {
     arrive(bulbFrame("100"));
     tick(9);
     EndSimulation(rig.program, face);
-    EXPECT_EQ(rig.program.ZephUIState, kStateSelectFixture);
+    EXPECT_EQ(rig.program.editor.ZephUIState, kStateSelectFixture);
     EXPECT_FALSE(face.timerOn);
     EXPECT_FALSE(face.gauge);
     EXPECT_FALSE(face.simulationControls);

@@ -1,7 +1,7 @@
 // The settings store's test form: a map, as forgiving of case as the real one.
 #pragma once
 
-#include "shell/settings_store.h"
+#include "util/settings_store.h"
 #include "util/text.h"
 
 #include <map>

@@ -1,0 +1,99 @@
+#include "editor/mode_commands.h"
+
+#include "editor/tool_bar_texts.h"
+
+namespace {
+
+// The document of a running simulation is frozen, and without one there is nothing to choose a tool for.
+bool editable(const ModeContext& context) {
+    return context.simulation.SimulationOpen && context.editor.ZephUIState != kStateSimulation;
+}
+
+void deselect(const ModeContext& context) {
+    context.face.ZephDeselectflg();
+    context.editor.ZephSelection.Object = 0;
+    context.face.redrawObjects();
+}
+
+// Locks hold again until the switch, which sets the flag for a selection made in the list.
+void changeTo(int state, const ModeContext& context) {
+    context.editor.ZephIgnoreLocks = false;
+    deselect(context);
+    ZephSwitchMode(state, context.editor.ZephDrawTool, context);
+    context.host.setStatusPanel(2, ZephUpdateStatusBarForUIState(context.simulation, context.editor, false));
+    context.face.CheckEnable(false);
+}
+
+void tellLimit(const char* what, int most, Host& host) {
+    host.messageBox(boxTitle("-Error"),
+                    "You have created the maximum number (" + std::to_string(most) + ") of " + what + ".",
+                    BoxIcon::Critical);
+}
+
+bool propFits(const ModeContext& context) {
+    if (context.simulation.FixtureCount >= kMaxFixtures) {
+        tellLimit("fixtures", kMaxFixtures, context.host);
+        return false;
+    }
+    if (context.simulation.PropCount >= kMaxProps) {
+        tellLimit("props", kMaxProps, context.host);
+        return false;
+    }
+    return true;
+}
+
+}  // namespace
+
+void mnuSelect_Click(const ModeContext& context) {
+    if (!editable(context) || context.editor.ZephUIState == kStateSelectFixture) return;
+    changeTo(kStateSelectFixture, context);
+}
+
+void mnuItemTool_Click(const ModeContext& context) {
+    if (!editable(context) || context.editor.ZephUIState == kStateSelectProp) return;
+    if (context.editor.ZephChangeToggle != kToggleProps) {
+        TogglePropFixtureButtons(kStateSelectProp, context.editor, context.face);
+    }
+    changeTo(kStateSelectProp, context);
+}
+
+void drawTool_Click(int tool, const ModeContext& context) {
+    ZephEditorState& editor = context.editor;
+    if (!editable(context)) return;
+    // The only tool with this guard: choosing light strings again goes on with the stroke, choosing another tool again
+    // forgets the fixture that bulbs were being added to.
+    if (tool == kToolLightStrings && editor.ZephUIState == kStateDrawing && editor.ZephDrawTool == tool) return;
+    if (tool >= kToolArchWizard && !propFits(context)) return;
+    if (objectSelected(editor)) deselect(context);
+    editor.ZephIgnoreLocks = false;
+    editor.ZephAppendTarget = 0;
+    context.host.setStatusPanel(2, "Drawing");
+    ZephSwitchMode(kModeDrawing, tool, context);
+    context.face.CheckEnable(false);
+}
+
+void chkCmdFixtureOrProp_MouseUp(int button, bool leftButton, const ModeContext& context) {
+    const int pressed = context.editor.ZephChangeToggle;
+    if (leftButton && editable(context) && button != pressed) {
+        context.editor.ZephChangeToggle = button;
+        if (button == kToggleFixtures) {
+            mnuSelect_Click(context);
+        } else {
+            mnuItemTool_Click(context);
+        }
+    }
+    context.face.showModeButtons();  // the control has changed itself at the click
+}
+
+void chkSimplePropMode_Click(bool simple, const ModeContext& context) {
+    context.editor.SimplePropMode = simple;
+    if (!editable(context)) return;
+    if (objectSelected(context.editor)) {
+        context.face.ZephDeselectflg();
+        context.editor.ZephSelection.Object = 0;
+    }
+    context.face.ZephLoadUIObjectList();
+    context.face.redrawObjects();
+    context.host.setStatusPanel(2, ZephUpdateStatusBarForUIState(context.simulation, context.editor, false));
+    context.face.CheckEnable(false);
+}

@@ -1,0 +1,96 @@
+#include "shell/command_icons.h"
+
+#include <QApplication>
+#include <QFile>
+#include <QIconEngine>
+#include <QPainter>
+#include <QPalette>
+#include <QSvgRenderer>
+
+// Outside every namespace, as the macro asks: pictures inside a static library are dropped unless they are named.
+static void initIconResource() {
+    Q_INIT_RESOURCE(icons);
+}
+
+namespace {
+
+constexpr int kField = 24;            // the drawings' own field
+constexpr double kBarFrom = 20.0;     // of the field: where the bar of a colour begins
+constexpr double kShrunkField = 0.8;  // of a drawing above such a bar
+
+QByteArray readDrawing(std::string_view name) {
+    initIconResource();
+    QFile file(QString(":/icons/%1.svg").arg(QString::fromUtf8(name.data(), static_cast<qsizetype>(name.size()))));
+    if (!file.open(QIODevice::ReadOnly)) {
+        qWarning("There is no picture named %s", qPrintable(file.fileName()));
+        return {};
+    }
+    return file.readAll();
+}
+
+class DrawingEngine : public QIconEngine {
+public:
+    DrawingEngine(QByteArray drawing, const QColor& bar) : drawing_(std::move(drawing)), bar_(bar) {}
+
+    void paint(QPainter* painter, const QRect& rect, QIcon::Mode mode, QIcon::State) override {
+        if (drawing_.isEmpty()) return;
+        const bool disabled = mode == QIcon::Disabled;
+        const QColor ink =
+            QApplication::palette().color(disabled ? QPalette::Disabled : QPalette::Active,
+                                          mode == QIcon::Selected ? QPalette::HighlightedText : QPalette::ButtonText);
+        QByteArray inked = drawing_;
+        inked.replace("currentColor", ink.name().toLatin1());
+        QSvgRenderer renderer(inked);
+        QRectF field(rect);
+        if (bar_.isValid()) field.setSize(field.size() * kShrunkField);
+        if (bar_.isValid()) field.moveLeft(field.left() + rect.width() * (1 - kShrunkField) / 2);
+        renderer.render(painter, field);
+        if (bar_.isValid()) paintBar(*painter, rect, disabled, ink);
+    }
+
+    QPixmap pixmap(const QSize& size, QIcon::Mode mode, QIcon::State state) override {
+        QPixmap drawn(size);
+        drawn.fill(Qt::transparent);
+        QPainter painter(&drawn);
+        paint(&painter, QRect(QPoint(), size), mode, state);
+        return drawn;
+    }
+
+    QIconEngine* clone() const override { return new DrawingEngine(*this); }
+
+private:
+    void paintBar(QPainter& painter, const QRect& rect, bool disabled, const QColor& ink) const {
+        const double unit = rect.height() / static_cast<double>(kField);
+        const QRectF bar(rect.left() + unit, rect.top() + kBarFrom * unit, rect.width() - 2 * unit,
+                         (kField - kBarFrom) * unit);
+        painter.setRenderHint(QPainter::Antialiasing);
+        painter.setOpacity(disabled ? 0.45 : 1.0);
+        painter.setPen(QPen(ink, unit));  // a colour like the ground's would not be seen without a border
+        painter.setBrush(bar_);
+        painter.drawRoundedRect(bar.adjusted(unit / 2, unit / 2, -unit / 2, -unit / 2), unit, unit);
+        painter.setOpacity(1.0);
+    }
+
+    QByteArray drawing_;
+    QColor bar_;  // not valid = none
+};
+
+}  // namespace
+
+QIcon commandIcon(std::string_view name) {
+    return QIcon(new DrawingEngine(readDrawing(name), QColor()));
+}
+
+QIcon colorIcon(std::string_view name, const QColor& color) {
+    return QIcon(new DrawingEngine(readDrawing(name), color));
+}
+
+QCursor pencilPointer(double devicePixelRatio) {
+    QPixmap pencil(QSize(kField, kField) * devicePixelRatio);
+    pencil.fill(Qt::transparent);
+    QPainter painter(&pencil);
+    QSvgRenderer(readDrawing("pointer-pencil")).render(&painter, QRectF(QPointF(), QSizeF(pencil.size())));
+    painter.end();
+    pencil.setDevicePixelRatio(devicePixelRatio);
+    return QCursor(pencil, 2, 21);
+}

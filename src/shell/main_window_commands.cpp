@@ -1,0 +1,248 @@
+// The main window's commands: what menus, buttons, keys and the object list lead to, and showing what is available.
+#include "editor/background.h"
+#include "model/data_directories.h"
+#include "shell/dialogs/about_dialog.h"
+#include "shell/main_window.h"
+#include "shell/recent_files.h"
+
+#include <QAction>
+#include <QApplication>
+#include <QFileDialog>
+#include <QKeyEvent>
+#include <QMenu>
+
+namespace {
+
+constexpr int kEditorFolder = 1;
+
+// Clipboard and undo stores are not there yet; what depends on them is computed as with empty ones.
+CommandInputs commandInputs(const Program& program) {
+    return {*program.simulation, program.editor, 0, {}, program.settings.FixtureTextLocation, false};
+}
+
+}  // namespace
+
+void frmZephMain::runCommand(Command command) {
+    switch (command) {
+    case Command::FileLoad:
+        mnuFileLoad_Click();
+        break;
+    case Command::FileExit:
+        mnuFileExit_Click();
+        return;
+    case Command::ItemTool:
+        mnuItemTool_Click(modes_.context());
+        break;
+    case Command::Select:
+        mnuSelect_Click(modes_.context());
+        break;
+    case Command::SimulationMode:
+        ::mnuSimulationMode_Click(program_, *this);
+        break;
+    case Command::HelpAbout:
+        mnuHelpAbout_Click();
+        break;
+    default:
+        if (const int tool = commandTool(command); tool != 0) drawTool_Click(tool, modes_.context());
+        break;
+    }
+    showPressedDrawButton();  // the control has changed itself at the click
+}
+
+bool frmZephMain::openFile(const QString& path, bool quiet) {
+    setEditorFile(path.toStdString(), *program_.simulation);
+    const bool loaded = LoadEditorFile(quiet, program_, *this, *this);
+    if (loaded) {
+        ZephUpdateRecentFilesList(program_.simulation->FilePath + program_.simulation->FileName, program_.settings);
+        UpdateRecentFileMenu();
+    } else {
+        program_.simulation->FilePath.clear();
+        program_.simulation->FileName.clear();
+        ZephLoadUIObjectList();
+    }
+    CheckEnable(false);
+    return loaded;
+}
+
+bool frmZephMain::mayLoad(std::string_view titleSuffix) {
+    ZephSwitchMode(kStateSelectFixture, program_, *this);
+    if (!program_.simulation->SimulationDirty) return true;
+    return host_.messageBox(boxTitle(titleSuffix),
+                            "This editor session has not been saved.  Are you sure you want to load a new one?",
+                            BoxIcon::Question, BoxButtons::YesNo) == BoxAnswer::Yes;
+}
+
+void frmZephMain::mnuFileLoad_Click() {
+    if (mayLoad("-Load?")) {
+        const QString folder =
+            QString::fromStdString(ZephReturnDataDirectory(kEditorFolder, program_.paths, program_.settings));
+        const QString file = QFileDialog::getOpenFileName(this, tr("Load File"), folder,
+                                                          tr("Zeph Editor Environment Files (ZEE) (*.zee)"));
+        if (!file.isEmpty()) openFile(file, false);
+    }
+    CheckEnable(false);
+}
+
+void frmZephMain::mnuRecentFiles_Click(int index) {
+    const std::string file = program_.settings.RecentFiles.at(static_cast<std::size_t>(index));
+    if (mayLoad("-Load Recent File?")) openFile(QString::fromStdString(file), false);
+    CheckEnable(false);
+}
+
+void frmZephMain::UpdateRecentFileMenu() {
+    QStringList captions;
+    for (const std::string& caption : ZephRecentFileCaptions(program_.settings, program_.paths))
+        captions.append(QString::fromStdString(caption));
+    commands_->showRecentFiles(captions);
+}
+
+void frmZephMain::mnuFileExit_Click() {
+    restoreIfMinimized();
+    close();
+}
+
+void frmZephMain::mnuHelpAbout_Click() {
+    frmZephAbout(frmZephAbout::Purpose::About, this).exec();
+}
+
+void frmZephMain::cmdStop_MouseUp() {
+    requestEnd();
+}
+
+void frmZephMain::sldIntensity_Scroll() {
+    tmrAdjustBrightness_.start();
+    program_.simulation->SimulationDirty = true;
+    host_.setStatusPanel(1, "Changed");
+}
+
+// The picture is made anew once the slider has stood still for a whole interval.
+void frmZephMain::tmrAdjustBrightness_Timer() {
+    const int intensity = CoolBar1_->band().intensity();
+    if (intensity != lastIntensity_) {
+        lastIntensity_ = intensity;
+        return;
+    }
+    tmrAdjustBrightness_.stop();
+    if (!program_.simulation->SimulationOpen || program_.simulating()) return;
+    program_.simulation->Background.PicIntensity = intensity;
+    program_.picBackground =
+        ZephResetBackground(*program_.simulation, program_.seams.programFolder, program_.seams.host);
+    redrawObjects();
+}
+
+void frmZephMain::restoreIfMinimized() {
+    if (isMinimized()) showNormal();
+}
+
+void frmZephMain::eraseRubberBand() {
+    // The band is no part of the composed canvas, so showing that again takes it away.
+    canvas_->picMain().update();
+}
+
+void frmZephMain::setCanvasPointer(CanvasPointer pointer) {
+    if (pointer == CanvasPointer::Pencil) {
+        canvas_->picMain().setCursor(pencilPointer(devicePixelRatioF()));
+    } else {
+        canvas_->picMain().unsetCursor();
+    }
+}
+
+void frmZephMain::ZephHighlightflg(std::int32_t object) {
+    objects_->ZephHighlightflg(object);
+}
+
+void frmZephMain::ZephDeselectflg() {
+    objects_->ZephDeselectflg();
+}
+
+void frmZephMain::ZephLoadUIObjectList() {
+    objects_->showRows(ZephListIndex(*program_.simulation, program_.editor));
+    objects_->showSimplePropMode(program_.editor.SimplePropMode, program_.editor.ZephUIState == kStateSelectProp);
+}
+
+void frmZephMain::showPressedDrawButton() {
+    for (const CommandRow& row : kCommandTable) {
+        if (row.kind != CommandKind::Toggle) continue;
+        commands_->action(row.id)->setChecked(row.drawButton == program_.editor.PressedDrawButton);
+    }
+}
+
+void frmZephMain::showModeButtons() {
+    objects_->showModeButtons(program_.editor.ZephChangeToggle);
+}
+
+void frmZephMain::CheckEnable(bool forceEnable) {
+    const CommandInputs inputs = commandInputs(program_);
+    ::CheckEnable(forceEnable, inputs, states_);
+    SetEditToolBarTips(*program_.simulation, program_.editor, inputs.undo, "", "", texts_);
+    const bool frozen = program_.simulating() || drawingInProgress(program_.editor);
+    commands_->show(states_, frozen);
+    commands_->show(texts_);
+    CoolBar1_->show(states_, frozen);
+    objects_->setModeButtonsEnabled(program_.simulation->SimulationOpen && !frozen);
+    objects_->showSimplePropMode(program_.editor.SimplePropMode, program_.editor.ZephUIState == kStateSelectProp);
+}
+
+bool frmZephMain::eventFilter(QObject* watched, QEvent* event) {
+    if (event->type() != QEvent::KeyPress && event->type() != QEvent::ShortcutOverride) {
+        return QMainWindow::eventFilter(watched, event);
+    }
+    const auto& key = *static_cast<QKeyEvent*>(event);
+    if (event->type() == QEvent::KeyPress) return keyDown(key);
+    // A key that the form takes is no shortcut: it comes again as a key that went down.
+    if (answerTo(key).action == KeyAction::None) return false;
+    event->accept();
+    return true;
+}
+
+KeyAnswer frmZephMain::answerTo(const QKeyEvent& event) const {
+    KeyDown down = keyDownOf(event);
+    down.ctrl = down.ctrl || keys_.CtPressed();
+    down.shift = down.shift || keys_.ShPressed();
+    const bool focusInForm = isActiveWindow() && QApplication::activeModalWidget() == nullptr &&
+                             QApplication::activePopupWidget() == nullptr;
+    return IWindowsHook_HookProc(down, {focusInForm, movingList_}, commandInputs(program_), states_.popContextMenu);
+}
+
+bool frmZephMain::keyDown(const QKeyEvent& event) {
+    const KeyAnswer answer = answerTo(event);
+    if (answer.action == KeyAction::None) return false;
+    carryOut(answer);
+    return true;
+}
+
+void frmZephMain::carryOut(const KeyAnswer& answer) {
+    switch (answer.action) {
+    case KeyAction::StopSimulation:
+        requestEnd();
+        break;
+    case KeyAction::RunCommand:
+        commands_->action(answer.command)->trigger();
+        break;
+    case KeyAction::ShowContextMenu:
+        showContextMenu(QCursor::pos());
+        break;
+    case KeyAction::NextRow:
+    case KeyAction::PreviousRow:
+        moveListRow(answer.action == KeyAction::PreviousRow);
+        break;
+    case KeyAction::CancelDrawing:
+        cancelStroke(modes_.context());
+        break;
+    case KeyAction::FinishDrawing:  // no stroke can be under way before the canvas takes the mouse
+    case KeyAction::None:
+        break;
+    }
+}
+
+void frmZephMain::moveListRow(bool backward) {
+    if (objects_->rows() < 1) return;
+    movingList_ = true;
+    const int row = nextListRow(objects_->highlightedRow(), objects_->rows(), backward);
+    flgObjectSelect_Click(objects_->objectOfRow(row), modes_.context());
+    movingList_ = false;
+}
+
+void frmZephMain::showContextMenu(const QPoint& globalPos) {
+    if (states_.popContextMenu && !program_.simulating()) commands_->contextMenu()->popup(globalPos);
+}
