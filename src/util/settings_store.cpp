@@ -1,6 +1,6 @@
 #include "util/settings_store.h"
 
-#include "shell/settings_file.h"
+#include "util/settings_file.h"
 
 #include <QStandardPaths>
 
@@ -31,8 +31,14 @@ FileSettingsStore::FileSettingsStore(const std::string& file) : file_(text(file)
         if (isIllegibleEntry(name, file_.value(name))) {
             problem_ = "the settings in " + file + " are damaged; what is legible of them is used";
         }
-        spelling_.insert_or_assign(name.toLower(), name);
     }
+    listNames();
+}
+
+void FileSettingsStore::listNames() {
+    spelling_.clear();
+    for (const QString& name : file_.allKeys())
+        spelling_.insert_or_assign(name.toLower(), name);
 }
 
 std::string FileSettingsStore::userFile() {
@@ -66,5 +72,6 @@ void FileSettingsStore::removeKey(std::string_view key) {
 
 bool FileSettingsStore::flush() {
     file_.sync();
+    listNames();  // another process may have brought new ones
     return file_.status() == QSettings::NoError;
 }

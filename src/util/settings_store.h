@@ -22,7 +22,8 @@ public:
     virtual void setValue(std::string_view key, std::string_view name, std::string_view text) = 0;
     // Removes the key with all its values.
     virtual void removeKey(std::string_view key) = 0;
-    // Brings what was written to where the next run, or another process, reads it. False where that failed.
+    // Brings what was written to where the next run, or another process, reads it, and takes in what others wrote
+    // since the store was opened. False where that failed.
     virtual bool flush() = 0;
     // Why the store as a whole could not be read, for the log; empty = it could.
     virtual std::string problem() const = 0;
@@ -46,6 +47,8 @@ public:
     std::string problem() const override { return problem_; }
 
 private:
+    void listNames();
+
     QSettings file_;
     std::map<QString, QString> spelling_;  // in lower case -> as it stands in the file
     std::string problem_;

@@ -75,6 +75,10 @@ TEST_F(FileStore, TwoProcessesKeepEachOthersValues) {
     first.flush();
     second.setValue(kKey, "B", "2");
     second.flush();
+    EXPECT_EQ(second.value(kKey, "A"), "1");
+    EXPECT_EQ(first.value(kKey, "B"), std::nullopt);
+    first.flush();
+    EXPECT_EQ(first.value(kKey, "B"), "2");
     const FileSettingsStore later(file);
     EXPECT_EQ(later.value(kKey, "A"), "1");
     EXPECT_EQ(later.value(kKey, "B"), "2");

@@ -1,4 +1,4 @@
-#include "shell/settings_file.h"
+#include "util/settings_file.h"
 
 #include <QIODevice>
 
