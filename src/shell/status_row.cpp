@@ -74,4 +74,6 @@ void StatusRow::showQueueLength(const QueueGaugeUpdate& update) {
 void StatusRow::showSimulationButtons(bool shown) {
     for (QPushButton* shownButton : {cmdSEPlay_, cmdSEStop_, cmdStop_})
         shownButton->setVisible(shown);
+    cmdSEPlay_->setEnabled(static_cast<bool>(cmdSEPlay_MouseUp));
+    cmdSEStop_->setEnabled(static_cast<bool>(cmdSEStop_MouseUp));
 }
