@@ -62,8 +62,6 @@ QString styleSheetOf(const Tones& tones) {
     return QString("QToolTip { border: 1px solid %3; padding: 4px; }"
                    "QStatusBar::item { border: none; }"
                    "QStatusBar QLabel { padding: 2px 8px; }"
-                   "QLabel#StatusBar1Panel2, QLabel#StatusBar1Panel3, QLabel#StatusBar1Panel4 {"
-                   " border-left: 1px solid %3; }"
                    "QToolBar { border: none; spacing: 1px; padding: 0px; }"
                    "QToolBar::separator { background: %3; width: 1px; margin: 4px 4px; }"
                    "QToolButton { border: 1px solid transparent; border-radius: 5px; padding: 2px; }"
@@ -74,7 +72,11 @@ QString styleSheetOf(const Tones& tones) {
                    "QMenuBar { padding: 2px 4px; }"
                    "QMenu { border: 1px solid %3; padding: 3px; }"
                    "QMenu::separator { height: 1px; background: %3; margin: 4px 8px; }"
-                   "QSplitter::handle { background: transparent; width: 6px; }")
+                   "QSplitter::handle { background: transparent; width: 6px; }"
+                   "QGroupBox { background: rgba(0, 0, 0, 28); border: 1px solid %3;"
+                   " border-radius: 5px; margin-top: 1.5em; padding: 4px 2px 2px 2px; }"
+                   "QGroupBox::title { subcontrol-origin: margin; left: 2px; color: rgb(%2); }"
+                   "QGroupBox::title:disabled { color: %3; }")
         .arg(QString("%1, %2, %3").arg(tones.text.red()).arg(tones.text.green()).arg(tones.text.blue()),
              QString("%1, %2, %3").arg(tones.accent.red()).arg(tones.accent.green()).arg(tones.accent.blue()),
              tones.mid.name());

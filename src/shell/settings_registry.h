@@ -4,9 +4,9 @@
 
 #include "link/communications.h"
 #include "model/settings.h"
-#include "shell/settings_store.h"
 #include "util/clock.h"
 #include "util/paths.h"
+#include "util/settings_store.h"
 
 #include <cstdint>
 

@@ -2,7 +2,7 @@
 // settings, the tool bands, and whoever keeps a value of its own in the store.
 #pragma once
 
-#include "shell/settings_store.h"
+#include "util/settings_store.h"
 
 #include <cstdint>
 #include <optional>

@@ -2,8 +2,8 @@
 // Lengths in twips. Called by start-up, a reset of the options, and the main window.
 #pragma once
 
-#include "shell/settings_store.h"
 #include "util/failure.h"
+#include "util/settings_store.h"
 
 #include <array>
 #include <cstdint>

@@ -65,8 +65,10 @@ BoxAnswer WindowHost::messageBox(std::string_view title, std::string_view text, 
     // An hourglass over a box that waits for a click would mislead.
     const bool wasBusy = busy_;
     setBusyPointer(false);
+    // Over an open dialog the box belongs to that dialog, or it could come to lie behind it.
+    QWidget* dialog = QApplication::activeModalWidget();
     QMessageBox box(boxIcon(icon), toQString(title), toQString(text).replace("\r\n", "\n"), boxButtons(buttons),
-                    window_);
+                    dialog != nullptr ? dialog : window_);
     box.setTextFormat(Qt::PlainText);
     const BoxAnswer answer = box.exec() == 0 && buttons == BoxButtons::Ok
                                  ? BoxAnswer::Ok

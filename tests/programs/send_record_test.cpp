@@ -1,7 +1,9 @@
 // Playing and recording captures, with real sockets over the loopback.
 #include "link/capture_file.h"
+#include "link/sequencer_message.h"
 #include "programs/tool/record_command.h"
 #include "programs/tool/send_command.h"
+#include "util/settings_store.h"
 
 #include <QCoreApplication>
 #include <QElapsedTimer>
@@ -170,4 +172,57 @@ TEST(Send, AnUnusableCaptureOrReceiverIsAMessage) {
         EXPECT_EQ(runSend(options), 1) << tcp;
         EXPECT_NE(testing::internal::GetCapturedStderr(), "");
     }
+}
+
+TEST(Send, OnRequestPlaysAndStopsAsTheButtonsAsk) {
+    QTemporaryDir folder;
+    qputenv("ZEPH_DATA", folder.path().toLocal8Bit());
+    const std::string file = folder.filePath("show.zcap").toStdString();
+    {
+        CaptureWriter writer(file);
+        for (std::int32_t i = 0; i < 500; ++i)
+            writer.piece(i * 10, "piece");
+    }
+    QUdpSocket ear;
+    ASSERT_TRUE(ear.bind(QHostAddress::LocalHost, 0));
+    ToolOptions made;
+    made.file = file;
+    made.port = ear.localPort();
+    made.onRequest = true;
+    std::atomic<pthread_t> thread{};
+    std::atomic<bool> running = false;
+    std::thread player([&] {
+        thread = pthread_self();
+        running = true;
+        EXPECT_EQ(runSend(made), 0);
+    });
+    const auto seqPid = [] {
+        const FileSettingsStore store(FileSettingsStore::userFile());
+        return store.value(kSharedIpcKey, "SeqPid").value_or("0");
+    };
+    const auto heard = [&](int patienceMs) {
+        int count = 0;
+        while (ear.waitForReadyRead(patienceMs)) {
+            while (ear.hasPendingDatagrams())
+                ear.readDatagram(nullptr, 0), ++count;
+            if (count >= 10) break;
+        }
+        return count;
+    };
+    while (!running || seqPid() == "0")
+        std::this_thread::sleep_for(std::chrono::milliseconds(5));
+    const auto pid = static_cast<std::int32_t>(QCoreApplication::applicationPid());
+    EXPECT_EQ(seqPid(), std::to_string(pid));
+    EXPECT_EQ(heard(100), 0) << "waits to be asked";
+    EXPECT_TRUE(sendToSequencer(pid, SequencerCommand::Start));
+    EXPECT_GE(heard(2000), 10);
+    EXPECT_TRUE(sendToSequencer(pid, SequencerCommand::Stop));
+    std::this_thread::sleep_for(std::chrono::milliseconds(100));
+    while (ear.hasPendingDatagrams())
+        ear.readDatagram(nullptr, 0);
+    EXPECT_EQ(heard(100), 0);
+    pthread_kill(thread, SIGTERM);
+    player.join();
+    EXPECT_EQ(seqPid(), "0") << "no longer registered";
+    qunsetenv("ZEPH_DATA");
 }

@@ -2,6 +2,7 @@
 #include "util/clock.h"
 #include "util/color.h"
 #include "util/error_log.h"
+#include "util/fault_log.h"
 #include "util/one_based.h"
 #include "util/paths.h"
 #include "util/random_source.h"
@@ -12,6 +13,7 @@
 
 #include <gtest/gtest.h>
 
+#include <csignal>
 #include <fstream>
 #include <regex>
 
@@ -68,9 +70,11 @@ TEST(SystemClock, IsNeverZeroAndPositiveAtTheStart) {
 
 namespace {
 
+constexpr int kFailingLine = __LINE__ + 4;
+
 bool failing(FailureReport& failures) try {
     OneBased<int, 2> numbers;
-    return numbers.at(3) == 0;  // line 73
+    return numbers.at(3) == 0;
 }
 ZEPH_GUARD(failures, "modTest", false)
 
@@ -81,7 +85,7 @@ TEST(Guard, ReportsTheProcedureAndTheLineOfTheFailure) {
     EXPECT_FALSE(failing(failures));
     ASSERT_EQ(failures.reports.size(), 1u);
     EXPECT_EQ(failures.reports[0].procedure, "Zeph.modTest.failing");
-    EXPECT_EQ(failures.reports[0].line, 73);
+    EXPECT_EQ(failures.reports[0].line, kFailingLine);
 }
 
 TEST(ErrorLog, ShowsOnlyTheFirstReportOfARunAndOnlyWithTheSwitch) {
@@ -109,6 +113,25 @@ TEST(ErrorLog, ShowsOnlyTheFirstReportOfARunAndOnlyWithTheSwitch) {
     ErrorLog silent(folder.filePath("no/such/folder.txt").toStdString(), false, host);
     silent.ErrReport("three", "Zeph.modTest.c", 1);
     EXPECT_EQ(host.boxes.size(), 1u);
+}
+
+TEST(FaultLog, WritesTheNameOfTheFaultAndLetsItGoItsWay) {
+    QTemporaryDir folder;
+    const std::string file = folder.filePath("errorlog.txt").toStdString();
+    EXPECT_EXIT(
+        {
+            installFaultLog(file);
+            raise(SIGILL);
+        },
+        testing::KilledBySignal(SIGILL), "");
+    std::ifstream lines(file);
+    std::string line;
+    std::getline(lines, line);
+    EXPECT_TRUE(std::regex_match(line, std::regex(R"(\d{4}-\d\d-\d\d \d\d:\d\d:\d\d:Illegal Instruction)"))) << line;
+
+    EXPECT_EQ(faultName(SIGFPE, FPE_INTDIV), "Integer Divide By Zero");
+    EXPECT_EQ(faultName(SIGSEGV, 0), "Access Violation");
+    EXPECT_EQ(faultName(SIGUSR1, 0), "Unknown (&H0000000A)");
 }
 
 TEST(Paths, StoredFormIsReversibleBelowTheBaseAndWholeElsewhere) {

@@ -35,10 +35,12 @@ constexpr std::array<CommandRow, 7> kCommands{{
      "FOLDER/) [--engine standard|opengl] [--seed N]",
      " --capture --at --from --to --fps --out --engine --seed ", " --capture --out ",
      "Draws the first frame at or after a time as a picture, or a stretch of time as a film through the installed\n"
-     "ffmpeg, or as numbered pictures in a folder."},
-    {"send", "send CAP.zcap [--host 127.0.0.1] [--port 30303] [--tcp] [--loop] [--speed X]",
-     " --host --port --tcp --loop --speed ", "",
-     "Plays a capture to a listening simulation in real time, one datagram (UDP) or write (TCP) a piece."},
+     "ffmpeg, or as numbered pictures in a folder. --engine opengl draws as the OpenGL window does, without a window:\n"
+     "it needs a driver, of a graphics card or in software, but no screen. Exit status 1 where there is none."},
+    {"send", "send CAP.zcap [--host 127.0.0.1] [--port 30303] [--tcp] [--loop] [--speed X] [--on-request]",
+     " --host --port --tcp --loop --speed --on-request ", "",
+     "Plays a capture to a listening simulation in real time, one datagram (UDP) or write (TCP) a piece. --on-request\n"
+     "registers as the sequencing program and plays when the window's buttons ask for it, until it is stopped."},
     {"record", "record --out CAP.zcap [--port 30303] [--address 127.0.0.1] [--tcp] [--seconds N]",
      " --out --port --address --tcp --seconds ", " --out ",
      "Writes what arrives on the port as a capture, until it is stopped. A recording that is killed stays readable up\n"
@@ -94,6 +96,7 @@ bool takeFlag(const std::string& name, ToolOptions& options) {
     if (name == "--json") return options.json = true;
     if (name == "--tcp") return options.tcp = true;
     if (name == "--loop") return options.loop = true;
+    if (name == "--on-request") return options.onRequest = true;
     return false;
 }
 

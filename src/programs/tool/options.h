@@ -27,6 +27,7 @@ struct ToolOptions {
     bool json = false;
     bool tcp = false;
     bool loop = false;
+    bool onRequest = false;
 };
 
 struct ParsedOptions {

@@ -2,6 +2,7 @@
 
 #include "link/capture_file.h"
 #include "programs/tool/progress_line.h"
+#include "programs/tool/sequencer_desk.h"
 #include "programs/tool/stop_signal.h"
 #include "util/failure.h"
 
@@ -13,6 +14,7 @@
 #include <algorithm>
 #include <cstdio>
 #include <memory>
+#include <utility>
 
 namespace {
 
@@ -83,16 +85,93 @@ private:
     QTcpSocket socket_;
 };
 
-// Plays the capture once, or until the user stops it. Times count from start. Returns false when stopped.
-bool play(const std::vector<CapturePiece>& pieces, double speed, std::chrono::steady_clock::time_point start,
-          Receiver& receiver, StopSignal& stop, ProgressLine& progress) {
-    for (const CapturePiece& piece : pieces) {
-        const std::chrono::duration<double, std::milli> due(piece.timeMs / speed);
-        if (stop.waitUntil(start + std::chrono::duration_cast<std::chrono::steady_clock::duration>(due))) return false;
-        receiver.send(piece.bytes, stop);
-        progress.show("sent %.1f s of %.1f s", piece.timeMs / 1000.0, pieces.back().timeMs / 1000.0);
+// Lets the time pass until a piece is due.
+class Pause {
+public:
+    virtual ~Pause() = default;
+    virtual bool until(std::chrono::steady_clock::time_point time) = 0;  // true: playing is to end
+};
+
+class PlainPause : public Pause {
+public:
+    explicit PlainPause(StopSignal& stop) : stop_(stop) {}
+    bool until(std::chrono::steady_clock::time_point time) override { return stop_.waitUntil(time); }
+
+private:
+    StopSignal& stop_;
+};
+
+// Listens for orders while it waits; the last one stands.
+class ListeningPause : public Pause {
+public:
+    ListeningPause(StopSignal& stop, SequencerDesk& desk) : stop_(stop), desk_(desk) {}
+
+    bool until(std::chrono::steady_clock::time_point time) override {
+        constexpr std::int64_t sliceMs = 20;  // a signal is answered within it
+        for (;;) {
+            const std::int64_t left =
+                std::chrono::duration_cast<std::chrono::milliseconds>(time - std::chrono::steady_clock::now()).count();
+            // The last millisecond is left to the exact wait.
+            if (const auto order = desk_.order(static_cast<int>(std::clamp<std::int64_t>(left - 1, 0, sliceMs)))) {
+                playOrdered = *order == SequencerCommand::Start;
+                return true;
+            }
+            if (left <= sliceMs) return stop_.waitUntil(time);
+            if (stop_.asked()) return true;
+        }
     }
-    return true;
+
+    bool playOrdered = false;
+
+private:
+    StopSignal& stop_;
+    SequencerDesk& desk_;
+};
+
+// A capture on its way to a receiver.
+struct Playback {
+    const std::vector<CapturePiece>& pieces;
+    double speed;
+    bool loop;
+    Receiver& receiver;
+    StopSignal& stop;
+    ProgressLine& progress;
+
+    std::chrono::steady_clock::duration scaled(std::int32_t ms) const {
+        return std::chrono::duration_cast<std::chrono::steady_clock::duration>(
+            std::chrono::duration<double, std::milli>(ms / speed));
+    }
+
+    // Once from its beginning. False where the pause ended it.
+    bool once(std::chrono::steady_clock::time_point start, Pause& pause) const {
+        for (const CapturePiece& piece : pieces) {
+            if (pause.until(start + scaled(piece.timeMs))) return false;
+            receiver.send(piece.bytes, stop);
+            progress.show("sent %.1f s of %.1f s", piece.timeMs / 1000.0, pieces.back().timeMs / 1000.0);
+        }
+        return true;
+    }
+
+    // To its end, or again and again.
+    void run(Pause& pause) const {
+        auto start = std::chrono::steady_clock::now();
+        while (once(start, pause) && loop)
+            start += scaled(std::max(pieces.back().timeMs, 1));
+    }
+};
+
+void playOnRequest(const Playback& playback) {
+    FileSettingsStore store(FileSettingsStore::userFile());
+    SequencerDesk desk(store);
+    ListeningPause pause(playback.stop, desk);
+    constexpr std::chrono::seconds aWhile(3600);
+    while (!playback.stop.asked()) {
+        if (std::exchange(pause.playOrdered, false)) {
+            playback.run(pause);
+        } else {
+            pause.until(std::chrono::steady_clock::now() + aWhile);
+        }
+    }
 }
 
 void send(const ToolOptions& options) {
@@ -102,18 +181,21 @@ void send(const ToolOptions& options) {
         std::fprintf(stderr, "%s, line %d: cut short, left out\n", options.file.c_str(), capture.cutLine);
     }
     if (capture.pieces.empty()) return;
-    StopSignal stop;  // before the sockets: threads that they start must not take the signal
     std::unique_ptr<Receiver> receiver;
     if (options.tcp) {
         receiver = std::make_unique<TcpReceiver>(options.host, options.port);
     } else {
         receiver = std::make_unique<UdpReceiver>(options.host, options.port);
     }
+    StopSignal stop;
     ProgressLine progress;
-    const std::chrono::duration<double, std::milli> length(std::max(capture.pieces.back().timeMs, 1) / options.speed);
-    auto start = std::chrono::steady_clock::now();
-    while (play(capture.pieces, options.speed, start, *receiver, stop, progress) && options.loop)
-        start += std::chrono::duration_cast<std::chrono::steady_clock::duration>(length);
+    const Playback playback{capture.pieces, options.speed, options.loop, *receiver, stop, progress};
+    if (options.onRequest) {
+        playOnRequest(playback);
+    } else {
+        PlainPause pause(stop);
+        playback.run(pause);
+    }
 }
 
 }  // namespace

@@ -15,7 +15,7 @@ namespace {
 
 constexpr int kFlashStepMs = 40;  // a step of the pixel flash speed
 constexpr const char* kDeadAddressStyle = "background: #a8322a; color: white; border-radius: 3px; padding: 3px 6px;";
-constexpr const char* kLiveAddressStyle = "padding: 3px 6px;";
+constexpr const char* kLiveAddressStyle = "padding: 3px 0;";
 
 QPushButton* button(const char* name, const QString& text) {
     auto* made = new QPushButton(text);
@@ -32,6 +32,7 @@ frmZephOptions::frmZephOptions(ZephOptionsDraft draft, const ZephAdapters& adapt
     setWindowTitle(QString::fromStdString(boxTitle("-Options")));
 
     tabOptions_->setObjectName("tabOptions");
+    tabOptions_->setUsesScrollButtons(false);  // the dialog is as wide as its tabs
     tabOptions_->addTab(tooltipsTab(), tr("Tooltips"));
     tabOptions_->addTab(generalTab(), tr("General"));
     tabOptions_->addTab(colorsTab(), tr("Samples and Colors"));

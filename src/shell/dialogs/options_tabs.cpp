@@ -59,13 +59,6 @@ Field* addRow(QFormLayout& layout, const QString& label, Field* field) {
     return field;
 }
 
-QLabel* note(const QString& text) {
-    auto* label = new QLabel(text);
-    label->setWordWrap(true);
-    label->setForegroundRole(QPalette::PlaceholderText);
-    return label;
-}
-
 // Groups side by side share a row of the grid.
 QWidget* tab(QGridLayout* grid) {
     auto* page = new QWidget;
@@ -152,7 +145,7 @@ QWidget* frmZephOptions::tooltipsTab() {
 QWidget* frmZephOptions::generalTab() {
     OptionControls& make = controls_;
     auto* files = form();
-    addRow(*files, tr("When the program &starts:"), make.list("cmbStartupOption", &ZephSettings::OnStartup));
+    addRow(*files, tr("When the program s&tarts:"), make.list("cmbStartupOption", &ZephSettings::OnStartup));
     addRow(*files, tr("&Save automatically after:"), make.list("cmbAutoSave", &ZephSettings::AutoSave));
     files->addRow(make.check("chkCheckFileExtension", tr("Check the e&xtension of files"),
                              &ZephSettings::CheckFileExtension,
@@ -205,10 +198,11 @@ QWidget* frmZephOptions::colorsTab() {
     picSample_->setObjectName("picSample");
     auto* sampleColors = form();
     addRow(*sampleColors, tr("&Background:"), cmdSampleBackgroundColor_);
-    addRow(*sampleColors, tr("&RGB fixtures:"), cmdSampleRGBColor_);
+    addRow(*sampleColors, tr("RGB fi&xtures:"), cmdSampleRGBColor_);
     auto* sample = new QHBoxLayout;
     sample->setSpacing(2 * kGapPx);
     sample->addLayout(sampleColors);
+    sample->setAlignment(sampleColors, Qt::AlignTop);
     sample->addWidget(picSample_, 1);
 
     auto* colors = form();
@@ -294,10 +288,9 @@ QWidget* frmZephOptions::bulbsTab() {
 
     QVBoxLayout* warnings = column(
         {make.check("chkBulbSizeWarning", tr("&bulbs too small for their shape"), &ZephSettings::BulbSizeWarning),
-         make.check("chkKeshBulbCountWarning", tr("a &ribbon with a wrong number of pixels"),
+         make.check("chkKeshBulbCountWarning", tr("a ribbon with a wrong &number of pixels"),
                     &ZephSettings::KeshBulbCountWarning),
-         make.check("chkBackgroundWarning", tr("a back&ground picture that is not there"),
-                    &ZephSettings::BackgroundWarning),
+         make.check("chkBackgroundWarning", tr("a fault of the back&ground picture"), &ZephSettings::BackgroundWarning),
          make.check("chkCorruptedFileWarning", tr("a file &changed by another program"),
                     &ZephSettings::NoCorruptFileWarning,
                     tr("Kept for other versions of the program; this one never warns of it"))});
@@ -324,17 +317,16 @@ QWidget* frmZephOptions::communicationsTab() {
     lblLocalIP_->setObjectName("lblLocalIP");
     lblLocalIP_->setTextFormat(Qt::PlainText);
     lblLocalIP_->setTextInteractionFlags(Qt::TextSelectableByMouse);
-    chkUseTCP_ = new QCheckBox(tr("Receive over &TCP"));
+    chkUseTCP_ = new QCheckBox(tr("Receive over &TCP until the program ends; it starts with UDP"));
     chkUseTCP_->setObjectName("chkUseTCP");
     auto* link = form();
     addRow(*link, tr("Simulation &port:"), txtZephPort_);
     addRow(*link, tr("Network &adapter:"), cmbAdapter_);
     link->addRow(QString(), lblLocalIP_);
     link->addRow(QString(), chkUseTCP_);
-    link->addRow(QString(), note(tr("Every start of the program goes back to UDP.")));
 
     auto* rendering = form();
-    rendering->addRow(make.check("chkAdvancedRendering", tr("Use the advanced &render engine (OpenGL)"),
+    rendering->addRow(make.check("chkAdvancedRendering", tr("Use the ad&vanced render engine (OpenGL)"),
                                  &ZephSettings::AdvancedRenderEngine));
     rendering->addRow(make.check("chkForceForward", tr("Bring the simulation to the &front when a sequence starts"),
                                  &ZephSettings::ForceSimulationForward));

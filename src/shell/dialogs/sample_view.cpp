@@ -1,7 +1,8 @@
 #include "shell/dialogs/sample_view.h"
 
+#include "util/rounding.h"
+
 #include <QPainter>
-#include <QPainterPath>
 
 namespace {
 
@@ -22,7 +23,7 @@ void SampleView::setColors(const QColor& background, const QColor& bulbs) {
 }
 
 QSize SampleView::sizeHint() const {
-    return {200, 84};
+    return {200, 64};
 }
 
 void SampleView::paintEvent(QPaintEvent*) {
@@ -35,8 +36,9 @@ void SampleView::paintEvent(QPaintEvent*) {
     painter.setPen(Qt::NoPen);
     QColor glow = bulbs_;
     glow.setAlpha(60);
-    for (double x = frame.left() + kSpacingPx / 2; x < frame.right() - kRadiusPx; x += kSpacingPx) {
-        const QPointF bulb(x, frame.center().y());
+    const int bulbs = floorToInt(frame.width() / kSpacingPx);
+    for (int n = 0; n < bulbs; ++n) {
+        const QPointF bulb = frame.center() + QPointF((n - (bulbs - 1) / 2.0) * kSpacingPx, 0);
         painter.setBrush(glow);
         painter.drawEllipse(bulb, kGlowPx, kGlowPx);
         painter.setBrush(bulbs_);

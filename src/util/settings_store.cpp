@@ -1,4 +1,4 @@
-#include "shell/settings_store.h"
+#include "util/settings_store.h"
 
 #include "util/failure.h"
 
