@@ -171,7 +171,12 @@ TEST_F(WindowCommands, TheListAndTabSelect) {
     EXPECT_EQ(panel(2), "Fixture Selected:Bulb - Layer:1");
     key(Qt::Key_Backtab, Qt::ShiftModifier);
     EXPECT_EQ(panel(2), "Fixture Selected:Right - Layer:16");
-    EXPECT_EQ(find<QTableWidget>("flgObjectSelect")->currentRow(), 2);
+    auto* list = find<QTableWidget>("flgObjectSelect");
+    QTest::mouseClick(list->viewport(), Qt::RightButton, {}, list->visualItemRect(list->item(1, 0)).center());
+    QTest::mousePress(list->viewport(), Qt::LeftButton, {}, list->visualItemRect(list->item(0, 0)).center());
+    QTest::mouseMove(list->viewport(), list->visualItemRect(list->item(1, 0)).center());
+    QTest::mouseRelease(list->viewport(), Qt::LeftButton, {}, list->visualItemRect(list->item(1, 0)).center());
+    EXPECT_EQ(list->selectedItems(), QList<QTableWidgetItem*>{list->item(2, 0)});
     key(Qt::Key_F2);
     EXPECT_EQ(rig.program.editor.ZephSelection.Object, 0);
     EXPECT_EQ(find<QAction>("mnuObjectProperties")->text(), "Prop Properties");
