@@ -31,7 +31,9 @@ class ProgramModes final : public SimulationDoor {
 public:
     ProgramModes(Program& program, SimulationFace& face) : program_(program), face_(face) {}
 
-    ModeContext context() { return {*program_.simulation, program_.editor, program_.seams.host, face_, *this}; }
+    ModeContext context() {
+        return {*program_.simulation, program_.editor, program_.seams.host, face_, *this, program_.failures};
+    }
     bool enterSimulation() override;
     void ZephCleanUpAfterSimulation() override;
 
