@@ -15,7 +15,10 @@ public:
     GLOffscreen(const GLOffscreen&) = delete;
     GLOffscreen& operator=(const GLOffscreen&) = delete;
 
-    bool isSeen() const override { return true; }
+    // Frames that nobody will look at need not be drawn; at first all are.
+    void setSeen(bool seen) noexcept { seen_ = seen; }
+
+    bool isSeen() const override { return seen_; }
     bool makeCurrent() override;
     GLProcedure resolve(const char* name) override;
     void swapBuffers() override;  // waits until everything is drawn
@@ -28,4 +31,5 @@ private:
     std::unique_ptr<Context> context_;
     GLApi api_;
     QSize size_;
+    bool seen_ = true;
 };

@@ -2,6 +2,7 @@
 #include "editor/background.h"
 #include "model/data_directories.h"
 #include "shell/dialogs/about_dialog.h"
+#include "shell/edit_options.h"
 #include "shell/main_window.h"
 #include "shell/recent_files.h"
 
@@ -27,6 +28,9 @@ void frmZephMain::runCommand(Command command) {
     switch (command) {
     case Command::FileLoad:
         mnuFileLoad_Click();
+        break;
+    case Command::FileOptions:
+        mnuFileOptions_Click();
         break;
     case Command::FileExit:
         mnuFileExit_Click();
@@ -97,6 +101,26 @@ void frmZephMain::UpdateRecentFileMenu() {
     for (const std::string& caption : ZephRecentFileCaptions(program_.settings, program_.paths))
         captions.append(QString::fromStdString(caption));
     commands_->showRecentFiles(captions);
+}
+
+void frmZephMain::mnuFileOptions_Click() {
+    program_.editor.ZephSelection.Object = 0;
+    ZephDeselectflg();
+    const OptionsOutcome outcome =
+        ZephEditOptions(registryContext(program_), this, program_.settings, program_.connection, program_.adapters);
+    if (outcome == OptionsOutcome::Kept) return;
+    // What shows at once.
+    program_.editor.SimplePropMode = program_.settings.SimplePropDisplay;
+    program_.RenderEngine = renderEngineOf(program_.settings);
+    if (outcome == OptionsOutcome::Reset) {
+        toolBands_ = ZephInitializeFromRegistryCoolbar(program_.seams.store, program_.failures);
+        CoolBar1_->arrange(toolBands_);
+        UpdateRecentFileMenu();
+    }
+    ZephLoadUIObjectList();
+    redrawObjects();
+    CoolBar1_->band().show(ZephSetOptionsToolbandStuff(program_.settings, *program_.simulation));
+    CheckEnable(false);
 }
 
 void frmZephMain::mnuFileExit_Click() {

@@ -152,6 +152,15 @@ TEST_F(Tool, RenderDrawsThroughOpenGLWithoutAScreen) {
     EXPECT_EQ(lit.pixel(5, 5), qRgb(255, 255, 255));
     EXPECT_EQ(lit.pixel(6, 5), qRgb(0, 0, 0));
     EXPECT_EQ(lit.pixel(14, 4), qRgb(255, 255, 255));
+
+    // Frames at 15, 30 and 45 ms for pictures at 0, 20 and 40; the command that ends at 30 is dark in the last two.
+    const QStringList film{
+        "render", path("roof.zee"), "--capture", path("roof.zcap"), "--engine", "opengl", "--from",
+        "0",      "--to",           "40",        "--fps",           "50",       "--out",  path("gl/")};
+    ASSERT_EQ(tool(film, {"DISPLAY", "WAYLAND_DISPLAY"}).status, 0);
+    EXPECT_EQ(QDir(path("gl")).entryList({"frame*.png"}).size(), 3);
+    EXPECT_EQ(QImage(path("gl/frame00001.png")).pixel(4, 4), qRgb(255, 255, 255));
+    EXPECT_EQ(QImage(path("gl/frame00003.png")).pixel(4, 4), qRgb(0, 0, 0));
 }
 
 TEST_F(Tool, TellsThatThereIsNoOpenGL) {

@@ -16,6 +16,7 @@ namespace {
 
 constexpr const char* kModule = "modZephRenderOPenGL";
 constexpr int kFramesPanel = 3;
+constexpr int kBarMargin = 8;  // pixels, above and below the panels together
 
 QSurfaceFormat windowFormat() {
     QSurfaceFormat format;
@@ -96,7 +97,7 @@ void frmZephOpenGL::addButton(QPushButton* button, const char* name, int panel, 
     row->addStretch();
     button->ensurePolished();
     // A bar that grew after the window was sized would take from the drawing.
-    StatusBar1_->setFixedHeight(row->sizeHint().height());
+    StatusBar1_->setFixedHeight(row->sizeHint().height() + kBarMargin);
     button->setObjectName(name);
     button->setFocusPolicy(Qt::NoFocus);  // Esc and the space bar stay with the form
     // Clicked is the left button let go over it.

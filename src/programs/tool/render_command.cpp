@@ -19,7 +19,9 @@ std::int64_t filmLength(const ToolOptions& options) {
 
 bool renderPicture(const ToolOptions& options, RenderStudio& studio, VirtualRun& run) {
     bool written = false;
+    studio.expectPicture(run.tickMs() >= *options.at);
     run.run(*options.at + kOpenGLFrameMs, studio.surface(), [&](std::int32_t t) {
+        studio.expectPicture(t + run.tickMs() >= *options.at);
         if (t < *options.at) return true;
         written = studio.picture().save(QString::fromLocal8Bit(options.out.c_str()));
         return false;
@@ -33,12 +35,14 @@ bool renderFilm(const ToolOptions& options, RenderStudio& studio, VirtualRun& ru
     const std::unique_ptr<FrameSink> sink = openFrameSink(options.out, studio.size(), options.fps);
     ProgressBar progress(pictures);
     std::int64_t next = 0;
+    studio.expectPicture(run.tickMs() >= *options.from);
     run.run(*options.to + kOpenGLFrameMs, studio.surface(), [&](std::int32_t t) {
         // A film faster than the frames shows a frame more than once.
         for (; next < pictures && filmTime(options, next) <= t; ++next) {
             sink->add(studio.picture());
             progress.show(next + 1);
         }
+        studio.expectPicture(next < pictures && t + run.tickMs() >= filmTime(options, next));
         return next < pictures;
     });
     sink->finish();

@@ -27,6 +27,7 @@ public:
 
     LightSurface& surface() override { return surface_; }
     QSize size() const override { return surface_.image().size(); }
+    void expectPicture(bool) override {}  // it keeps images of colours from frame to frame
     QImage picture() override { return surface_.image(); }
 
 private:
@@ -51,6 +52,7 @@ public:
 
     LightSurface& surface() override { return surface_; }
     QSize size() const override { return size_; }
+    void expectPicture(bool wanted) override { target_.setSeen(wanted); }
     QImage picture() override { return target_.image(); }
 
 private:

@@ -15,7 +15,9 @@ public:
     virtual ~RenderStudio() = default;
     virtual LightSurface& surface() = 0;
     virtual QSize size() const = 0;  // pixels
-    virtual QImage picture() = 0;    // the last frame; valid until the next one
+    // Whether the next frame is asked for by picture(): one that is not may be left out where frames stand alone.
+    virtual void expectPicture(bool wanted) = 0;
+    virtual QImage picture() = 0;  // the last frame; valid until the next one
 };
 
 // Ready to draw the display on the background of its document. engine: "standard" or "opengl". nullptr where it cannot
