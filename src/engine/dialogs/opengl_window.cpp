@@ -74,32 +74,34 @@ frmZephOpenGL::frmZephOpenGL(GLWindowActions actions, QWidget* parent)
     layout->addWidget(container_, 1);
     layout->addWidget(StatusBar1_);
 
-    constexpr std::array<int, 5> kStretch{0, 1, 1, 1, 1};
+    constexpr std::array<int, 5> kStretch{0, 0, 3, 1, 2};
     for (std::size_t panel = 1; panel < panels_.size(); ++panel) {
         panels_[panel] = new QLabel(StatusBar1_);
         panels_[panel]->setObjectName(QString("StatusBar1Panel%1").arg(panel));
         StatusBar1_->addWidget(panels_[panel], kStretch[panel]);
     }
-    addButton(new QPushButton(tr("Stop")), "cmdStop", 1, [this] { stop(); });
-    addButton(new QPushButton(tr("Play Show")), "cmdSEPlay", 2, actions_.cmdSEPlay_MouseUp);
-    addButton(new QPushButton(tr("Stop Show")), "cmdSEStop", 4, actions_.cmdSEStop_MouseUp);
+    // In the last panel, which stays empty in a simulation, in the order of the main window's row.
+    auto* row = new QHBoxLayout(panels_[4]);
+    row->setContentsMargins(4, 2, 4, 2);
+    row->addStretch();
+    addButton(tr("Play"), "cmdSEPlay", *row, actions_.cmdSEPlay_MouseUp);
+    addButton(tr("Halt"), "cmdSEStop", *row, actions_.cmdSEStop_MouseUp);
+    addButton(tr("Stop"), "cmdStop", *row, [this] { stop(); });
+    // A bar that grew after the window was sized would take from the drawing.
+    StatusBar1_->setFixedHeight(row->sizeHint().height() + kBarMargin);
 }
 
 frmZephOpenGL::~frmZephOpenGL() {
     delete container_;  // and the drawing, which tells us of its size and keys until it is gone
 }
 
-void frmZephOpenGL::addButton(QPushButton* button, const char* name, int panel, const std::function<void()>& action) {
-    QLabel* label = panels_[static_cast<std::size_t>(panel)];
-    auto* row = new QHBoxLayout(label);
-    row->setContentsMargins(4, 2, 4, 2);
-    row->addWidget(button);
-    row->addStretch();
+void frmZephOpenGL::addButton(const QString& text, const char* name, QHBoxLayout& row,
+                              const std::function<void()>& action) {
+    auto* button = new QPushButton(text, panels_[4]);
     button->ensurePolished();
-    // A bar that grew after the window was sized would take from the drawing.
-    StatusBar1_->setFixedHeight(row->sizeHint().height() + kBarMargin);
     button->setObjectName(name);
     button->setFocusPolicy(Qt::NoFocus);  // Esc and the space bar stay with the form
+    row.addWidget(button);
     // Clicked is the left button let go over it.
     if (action) connect(button, &QPushButton::clicked, this, action);
 }

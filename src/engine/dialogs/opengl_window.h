@@ -12,6 +12,7 @@
 #include <functional>
 #include <optional>
 
+class QHBoxLayout;
 class QLabel;
 class QPushButton;
 class QStatusBar;
@@ -53,7 +54,7 @@ private:
     friend bool ZephCreateRenderWindow(QSize canvas, FailureReport& failures, frmZephOpenGL& window);
     class Drawing;
 
-    void addButton(QPushButton* button, const char* name, int panel, const std::function<void()>& action);
+    void addButton(const QString& text, const char* name, QHBoxLayout& row, const std::function<void()>& action);
 
     GLWindowActions actions_;
     Drawing* drawing_;    // owned by its container
