@@ -49,8 +49,6 @@ bool OpenGLSurface::ZephGLStartup(const GLScene& scene, GLTarget& target, Failur
     work_.Instances.reserve(listed);
     work_.Batches.reserve(units + listed);
     mostListed_ = listed;
-    notedIn_.assign(units, 0);
-    pass_ = 1;
     target_ = &target;
     failures_ = &failures;
     document_ = &scene.Document;
@@ -145,21 +143,18 @@ void OpenGLSurface::lightUnit(std::int32_t number, const std::uint8_t* bulbLit, 
 }
 
 void OpenGLSurface::noteRange(std::int32_t number, const GLPlanUnit& unit) {
-    std::uint32_t& noted = notedIn_[static_cast<std::size_t>(number)];
-    if (noted == pass_) submit();  // a second colour for the same slots
-    noted = pass_;
+    // Slots are looked up when all is painted: a unit out of order would light up where it was bridged as dark, or give
+    // its slots a second colour.
+    if (number <= lastUnit_) submit();
+    lastUnit_ = number;
     handedOver_ = false;
 
     const bool first = work_.FirstSlot == work_.EndSlot;
     work_.FirstSlot = first ? unit.FirstSlot : std::min(work_.FirstSlot, unit.FirstSlot);
     work_.EndSlot = std::max(work_.EndSlot, unit.FirstSlot + unit.SlotCount);
 
-    // What lies between must be dark, and so it is where nothing above the last range was noted yet.
-    const bool follows = lastUnit_ != 0 && lastUnit_ == highestUnit_ && number > lastUnit_;
-    highestUnit_ = std::max(highestUnit_, number);
-    lastUnit_ = number;
     const bool afterRange = !work_.Batches.empty() && work_.Batches.back().Shape < 0;
-    if (follows && afterRange && unit.FirstIndex - rangeEnd_ <= kBridgedIndices) {
+    if (afterRange && unit.FirstIndex - rangeEnd_ <= kBridgedIndices) {
         work_.RangeCounts.back() += unit.FirstIndex + unit.IndexCount - rangeEnd_;
     } else {
         if (!afterRange) work_.Batches.push_back({-1, static_cast<std::int32_t>(work_.RangeCounts.size()), 0});
@@ -206,8 +201,7 @@ void OpenGLSurface::forgetNoted() {
     work_.Instances.clear();
     work_.Batches.clear();
     handedOver_ = false;
-    highestUnit_ = lastUnit_ = 0;
-    ++pass_;
+    lastUnit_ = 0;
 }
 
 void OpenGLSurface::endFrame() {

@@ -66,14 +66,11 @@ private:
     GLPlan plan_;  // without what lies on the GPU
     GLWork work_;
 
-    std::size_t mostListed_ = 0;          // bulbs in one upload
-    bool current_ = false;                // the frame under way can be drawn
-    bool lostTold_ = false;               // a lost context is reported once
-    bool begun_ = false;                  // the background is painted
-    bool handedOver_ = false;             // what is noted lies on the GPU
-    std::uint32_t pass_ = 0;              // of what is noted together
-    std::vector<std::uint32_t> notedIn_;  // [unit], the last pass in which it was noted
-    std::int32_t highestUnit_ = 0;        // noted in this pass
-    std::int32_t lastUnit_ = 0;           // of the last range of this pass, 0 = none
-    std::int32_t rangeEnd_ = 0;           // one past the last index of the last range
+    std::size_t mostListed_ = 0;  // bulbs in one upload
+    bool current_ = false;        // the frame under way can be drawn
+    bool lostTold_ = false;       // a lost context is reported once
+    bool begun_ = false;          // the background is painted
+    bool handedOver_ = false;     // what is noted lies on the GPU
+    std::int32_t lastUnit_ = 0;   // of the ranges noted since the last upload was painted, 0 = none
+    std::int32_t rangeEnd_ = 0;   // one past the last index of the last range
 };

@@ -89,6 +89,7 @@ struct WindowCommands : testing::Test {
 }  // namespace
 
 TEST_F(WindowCommands, EveryCommandHasItsActionPictureAndTip) {
+    open();
     for (const CommandRow& row : kCommandTable) {
         if (row.id == Command::None) continue;
         if (row.kind == CommandKind::Menu) {

@@ -86,7 +86,7 @@ frmZephOpenGL::frmZephOpenGL(GLWindowActions actions, QWidget* parent)
 }
 
 frmZephOpenGL::~frmZephOpenGL() {
-    actions_ = {};  // the drawing goes after us, and what it still has to tell concerns nobody
+    delete container_;  // and the drawing, which tells us of its size and keys until it is gone
 }
 
 void frmZephOpenGL::addButton(QPushButton* button, const char* name, int panel, const std::function<void()>& action) {
