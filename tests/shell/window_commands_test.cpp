@@ -29,9 +29,11 @@ QColor firstInk(const QImage& drawn) {
 // The window with a document of three fixtures: "Bulb" alone on level 1, "Left" and "Right" of the prop "Pair", on a
 // canvas of 60 x 30 pixels or larger.
 struct WindowCommands : testing::Test {
-    void open(int widthPixels = 60, int heightPixels = 30) {
+    void SetUp() override {
         rig.start();
         rig.startUp(window);
+    }
+    void open(int widthPixels = 60, int heightPixels = 30) {
         const auto display = std::make_unique<ZephSimulation>();
         ShellRig::buildDisplay(*display);
         display->Background.EditorWidthTwips = widthPixels * TwipsPerPixelX;
@@ -132,7 +134,7 @@ TEST_F(WindowCommands, WithoutADocumentOnlyFilesAndHelpCanBeReached) {
         if (row.id == Command::None || row.kind == CommandKind::Menu) continue;
         if (find<QAction>(std::string(row.name).c_str())->isEnabled()) enabled.append(toQString(row.name));
     }
-    EXPECT_EQ(enabled, (QStringList{"mnuFileLoad", "mnuFileExit", "mnuHelpAbout"}));
+    EXPECT_EQ(enabled, (QStringList{"mnuFileLoad", "mnuFileOptions", "mnuFileExit", "mnuHelpAbout"}));
     EXPECT_FALSE(find<QToolButton>("chkCmdFixtureOrProp(1)")->isEnabled());
     EXPECT_FALSE(find<QMenu>("mnuDebug")->menuAction()->isVisible());
     key(Qt::Key_F2);
