@@ -62,7 +62,6 @@ QString styleSheetOf(const Tones& tones) {
     return QString("QToolTip { border: 1px solid %3; padding: 4px; }"
                    "QStatusBar::item { border: none; }"
                    "QStatusBar QLabel { padding: 2px 8px; }"
-                   "QStatusBar #StatusBar1Panel2, #StatusBar1Panel3, #StatusBar1Panel4 { border-left: 1px solid %3; }"
                    "QToolBar { border: none; spacing: 1px; padding: 0px; }"
                    "QToolBar::separator { background: %3; width: 1px; margin: 4px 4px; }"
                    "QToolButton { border: 1px solid transparent; border-radius: 5px; padding: 2px; }"

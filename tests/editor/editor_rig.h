@@ -61,7 +61,10 @@ public:
     void redrawObjects() override { calls.push_back("redraw"); }
     void ZephHighlightflg(std::int32_t object) override { highlighted = object; }
     void ZephDeselectflg() override { highlighted = 0; }
-    void ZephLoadUIObjectList() override { calls.push_back("list"); }
+    void ZephLoadUIObjectList() override {
+        require(!listFails, "no list");
+        calls.push_back("list");
+    }
     void showPressedDrawButton() override { pressed = editor.PressedDrawButton; }
     void showModeButtons() override { modeButton = editor.ZephChangeToggle; }
     void CheckEnable(bool) override { calls.push_back("enable"); }
@@ -80,4 +83,5 @@ public:
     int modeButton = -1;
     std::int32_t highlighted = 0;
     bool simulationStarts = true;
+    bool listFails = false;
 };

@@ -5,7 +5,7 @@
 namespace {
 
 struct Modes : testing::Test {
-    ModeContext context() { return {*rig.simulation, rig.editor, host, face, face}; }
+    ModeContext context() { return {*rig.simulation, rig.editor, host, face, face, failures}; }
     void expect(int state, int button, const char* panel) {
         EXPECT_EQ(rig.editor.ZephUIState, state);
         EXPECT_EQ(face.pressed, button);
@@ -14,6 +14,7 @@ struct Modes : testing::Test {
 
     EditorRig rig;
     RecordingHost host;
+    CollectingFailures failures;
     RecordingModeFace face{rig.editor};
 };
 
@@ -69,6 +70,14 @@ TEST_F(Modes, TheSimulationStandsBehindItsDoor) {
     expect(kStateSelectFixture, 3, "Select Fixture");
     EXPECT_EQ(face.modeButton, kToggleFixtures);
     EXPECT_EQ(face.count("clean up"), 1);
+}
+
+TEST_F(Modes, AFailureIsReportedUnderTheProceduresName) {
+    face.listFails = true;
+    ZephSwitchMode(kStateSelectProp, 1, context());
+    ASSERT_EQ(failures.reports.size(), 1U);
+    EXPECT_EQ(failures.reports[0].procedure, "Zeph.modZephEditorFunctions.ZephSwitchMode");
+    EXPECT_EQ(failures.reports[0].description, "no list");
 }
 
 TEST_F(Modes, LeavingAStrokeGivesItsFixtureBack) {

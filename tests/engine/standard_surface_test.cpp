@@ -75,7 +75,7 @@ TEST(StandardSurface, TellsNothingWhileThePictureStaysAndOnlyTheBulbThatMoved) {
         Stage::addPoint(fixture, kPointBulb, x, 100);
     }
     stage.finish();
-    SilentReport report;
+    CollectingFailures report;
     StandardSurface surface;
     ASSERT_TRUE(surface.prepare(stage.scene(stage.tables), report));
     const auto frame = [&](std::uint8_t first, std::uint8_t second) {
@@ -100,7 +100,7 @@ TEST(StandardSurface, RefusesACanvasOrTablesThatItCannotDraw) {
     ZephFixture& fixture = stage.add(kFixtureBulbs, kChannelRgb, 2, 1);
     Stage::addPoint(fixture, kPointBulb, 5, 5);
     stage.finish();
-    SilentReport report;
+    CollectingFailures report;
     StandardSurface surface;
     const auto prepared = [&](int width, int height, std::int32_t handle) {
         stage.background = QImage(width, height, QImage::Format_RGB32);
@@ -110,7 +110,7 @@ TEST(StandardSurface, RefusesACanvasOrTablesThatItCannotDraw) {
     EXPECT_FALSE(prepared(0, 0, 0));
     EXPECT_FALSE(prepared(2501, 10, 0));
     EXPECT_FALSE(prepared(10, 10, 3));
-    EXPECT_EQ(report.count, 3);
+    EXPECT_EQ(report.reports.size(), 3u);
     surface.beginFrame();  // unprepared: nothing happens
     surface.drawGroup({1, 1, 1, 0, kWhite, 255}, stage.tables.RGBData[1]);
     surface.endFrame();
