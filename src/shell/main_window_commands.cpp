@@ -106,6 +106,9 @@ void frmZephMain::UpdateRecentFileMenu() {
 void frmZephMain::mnuFileOptions_Click() {
     program_.editor.ZephSelection.Object = 0;
     ZephDeselectflg();
+    redrawObjects();
+    host_.setStatusPanel(2, ZephUpdateStatusBarForUIState(*program_.simulation, program_.editor, false));
+    CheckEnable(false);
     const OptionsOutcome outcome =
         ZephEditOptions(registryContext(program_), this, program_.settings, program_.connection, program_.adapters);
     if (outcome == OptionsOutcome::Kept) return;

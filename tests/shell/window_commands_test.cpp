@@ -31,6 +31,7 @@ QColor firstInk(const QImage& drawn) {
 struct WindowCommands : testing::Test {
     void open(int widthPixels = 60, int heightPixels = 30) {
         rig.start();
+        rig.startUp(window);
         const auto display = std::make_unique<ZephSimulation>();
         ShellRig::buildDisplay(*display);
         display->Background.EditorWidthTwips = widthPixels * TwipsPerPixelX;
@@ -86,6 +87,7 @@ struct WindowCommands : testing::Test {
 }  // namespace
 
 TEST_F(WindowCommands, EveryCommandHasItsActionPictureAndTip) {
+    open();
     for (const CommandRow& row : kCommandTable) {
         if (row.id == Command::None) continue;
         if (row.kind == CommandKind::Menu) {
