@@ -38,6 +38,7 @@ int main(int count, char** arguments) {
     }
     BenchReport report;
     benchLoad(report);
+    benchUndo(report);
     benchParser(report);
     benchCommands(report);
     benchCompile(report);

@@ -102,10 +102,7 @@ bool loadBody(const Node& root, const BodyContext& context, ZephSimulation& simu
             result = false;
         }
     }
-    for (int f = 1; f <= simulation.FixtureCount; ++f) {
-        ZephFixture& fixture = simulation.Fixtures[f];
-        if (fixture.AssignedItem != 0) fixture.AssignedItemName = propOrEmpty(simulation, fixture.AssignedItem).Name;
-    }
+    nameAssignedProps(simulation);
     return result;
 }
 

@@ -2,6 +2,7 @@
 
 #include "model/checksum.h"
 #include "model/editor_body.h"
+#include "model/editor_elements.h"
 #include "model/source_text.h"
 #include "model/xml_scanner.h"
 
@@ -196,14 +197,11 @@ bool ZephLoadVisualizerXML(bool showErrors, const EditorFileContext& context, Ze
     });
 }
 
-bool ZephLoadVisualizerXML(const pugi::xml_document& stored, bool showErrors, const EditorFileContext& context,
+bool ZephLoadVisualizerXML(const DocumentSnapshot& stored, bool showErrors, const EditorFileContext& context,
                            ZephSimulation& simulation) {
-    return guardedLoad(showErrors, context, simulation, [&](const LoadFrame& frame) {
-        const XmlNode root(stored.document_element());
-        if (!root || root.name() != kRootName) {
-            frame.speaker.say(root ? kInvalidRoot : kInvalidXml);
-            return false;
-        }
-        return told(readThroughGate(root, context, simulation), frame.speaker);
+    return guardedLoad(showErrors, context, simulation, [&](const LoadFrame&) {
+        restoreSnapshot(stored, context.paths, simulation);
+        simulation.zephSaveFileVersion = kFileVersion;
+        return true;
     });
 }

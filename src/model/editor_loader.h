@@ -2,13 +2,10 @@
 #pragma once
 
 #include "model/document.h"
+#include "model/document_snapshot.h"
 #include "util/failure.h"
 #include "util/host.h"
 #include "util/paths.h"
-
-namespace pugi {
-class xml_document;
-}
 
 // What loading and saving use besides the document itself.
 struct EditorFileContext {
@@ -24,9 +21,9 @@ struct EditorFileContext {
 // could be read. showErrors false keeps every message box back; the failures of single records are reported always.
 [[nodiscard]] bool ZephLoadVisualizerXML(bool showErrors, const EditorFileContext& context, ZephSimulation& simulation);
 
-// Loads a document that undo or redo kept. Such a document carries no checksum, and the caller has emptied the
-// records before.
-[[nodiscard]] bool ZephLoadVisualizerXML(const pugi::xml_document& stored, bool showErrors,
+// Loads a document that undo or redo kept. Such a document is of the present version and carries no checksum, and the
+// caller has emptied the records before.
+[[nodiscard]] bool ZephLoadVisualizerXML(const DocumentSnapshot& stored, bool showErrors,
                                          const EditorFileContext& context, ZephSimulation& simulation);
 
 // How a text is read. The quick form gives up on unusual spellings and reads nothing then; the general form reads
