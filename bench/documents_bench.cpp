@@ -2,6 +2,7 @@
 // take instead: the document as text, and as a tree of a general parser.
 #include "bench/bench_report.h"
 #include "model/editor_writer.h"
+#include "model/object_files.h"
 #include "model/ui_state.h"
 #include "model/undo.h"
 #include "tests/support/limit_document.h"
@@ -93,4 +94,39 @@ void benchUndo(BenchReport& report) {
     const bool good = display.failures.reports.empty() && document.FixtureCount == kMaxFixtures;
     report.goal("undo-record", millisecondsText(later), "at most 3 ms a step", good && later <= 3000);
     report.goal("undo", millisecondsText(back), "at most 10 ms before the redrawing", good && back <= 10'000);
+}
+
+void benchObjectFiles(BenchReport& report) {
+    Display display;
+    ZephSimulation& document = *display.simulation;
+    buildLimitDocument(document, {.fixtures = kMaxFixturesInProp, .props = 1});
+    const std::string path = display.folder.path().toStdString() + "/large.zpf";
+    const ObjectSaving saving{"21.11.26 10:00:00", display.host, display.failures};
+    bool good = true;
+    bool channelsSeen = false;
+    const auto write = [&] {
+        good = ZephSavePropXML(document, document.Props[1], path, kChannelChoiceYes, saving) && good;
+    };
+    const auto forget = [&] {
+        document.FixtureCount = kMaxFixturesInProp;
+        document.PropCount = 1;
+    };
+    const auto read = [&] { good = ZephLoadPropFileXML(path, display.context, document, channelsSeen) && good; };
+    const double writing = medianMicroseconds(kRuns, write);
+    const double reading = medianMicroseconds(kRuns, forget, read);
+    const double both = medianMicroseconds(kRuns, forget, [&] {
+        write();
+        read();
+    });
+    good = good && document.FixtureCount == 2 * kMaxFixturesInProp && document.Props[2].AssignedCount == 64;
+
+    pugi::xml_document tree;
+    const double peer = medianMicroseconds(
+        kRuns, [&] { good = tree.load_file(path.c_str()) && tree.save_file((path + ".tree").c_str()) && good; });
+    const std::string group = "A prop of 64 fixtures of 256 points and 16 channels";
+    report.row(group, "pugixml, tree read and written, no records", peer);
+    report.row(group, "write the prop file (flushed to the disk)", writing);
+    report.row(group, "read it into the document", reading);
+    report.row(group, "write and read", both);
+    report.goal("prop-file", millisecondsText(both), "at most 20 ms written and read", good && both <= 20'000);
 }

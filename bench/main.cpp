@@ -39,6 +39,7 @@ int main(int count, char** arguments) {
     BenchReport report;
     benchLoad(report);
     benchUndo(report);
+    benchObjectFiles(report);
     benchParser(report);
     benchCommands(report);
     benchCompile(report);

@@ -3,6 +3,7 @@
 
 #include "model/document.h"
 #include "model/document_snapshot.h"
+#include "model/document_source.h"
 #include "util/failure.h"
 #include "util/host.h"
 #include "util/paths.h"
@@ -25,10 +26,6 @@ struct EditorFileContext {
 // caller has emptied the records before.
 [[nodiscard]] bool ZephLoadVisualizerXML(const DocumentSnapshot& stored, bool showErrors,
                                          const EditorFileContext& context, ZephSimulation& simulation);
-
-// How a text is read. The quick form gives up on unusual spellings and reads nothing then; the general form reads
-// them all. Where the quick form does read, both give the same records, messages and reports.
-enum class TextReading { QuickThenGeneral, GeneralOnly, QuickOnly };
 
 // As the file of that text, already in memory. The name stands in the messages. QuickOnly gives false, silently and
 // without touching a record, where the quick form gives up.
