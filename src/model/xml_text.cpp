@@ -3,6 +3,7 @@
 #include <array>
 #include <cassert>
 #include <charconv>
+#include <utility>
 
 namespace {
 
@@ -78,6 +79,10 @@ std::string withoutForbidden(std::string_view text) {
         text.remove_prefix(std::max<std::size_t>(forbidden, 1));
     }
     return allowed;
+}
+
+std::string XmlText::take() {
+    return std::exchange(text_, {});
 }
 
 void XmlText::openStart(std::string_view name) {

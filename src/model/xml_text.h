@@ -30,7 +30,7 @@ public:
     void raw(std::string_view text) { text_.append(text); }
 
     std::size_t size() const { return text_.size(); }
-    std::string take() { return std::move(text_); }
+    std::string take();  // leaves nothing behind
 
 private:
     void beginAttribute(std::string_view name);
