@@ -7,8 +7,7 @@ namespace {
 
 // By the rights themselves: who may do everything is not kept from writing, but meant to be.
 bool mayBeReplaced(const QString& path) {
-    constexpr QFile::Permissions kAnyWrite =
-        QFile::WriteOwner | QFile::WriteUser | QFile::WriteGroup | QFile::WriteOther;
+    constexpr QFile::Permissions kAnyWrite = QFile::WriteOwner | QFile::WriteGroup | QFile::WriteOther;
     const QFileInfo info(path);
     return !info.exists() || (info.isWritable() && (QFile::permissions(path) & kAnyWrite));
 }
