@@ -79,3 +79,4 @@ void benchCommands(BenchReport& report);
 void benchCompile(BenchReport& report);
 void benchMasks(BenchReport& report);
 void benchFrame(BenchReport& report);
+void benchGL(BenchReport& report);

@@ -45,6 +45,7 @@ int main(int count, char** arguments) {
     benchCompile(report);
     benchMasks(report);
     benchFrame(report);
+    benchGL(report);
     if (!goalsOnly) printRows(report);
     printGoals(report);
     return 0;

@@ -38,9 +38,9 @@ install_packages() {
 }
 
 # What building and running takes.
-BUILD_PACKAGES=(g++ cmake ninja-build ccache pkg-config qt6-base-dev qt6-svg-dev libpugixml-dev libgtest-dev libgmock-dev
-    libpixman-1-dev)
+BUILD_PACKAGES=(g++ cmake ninja-build ccache pkg-config qt6-base-dev qt6-svg-dev libegl-dev libpugixml-dev libgtest-dev
+    libgmock-dev libpixman-1-dev)
 # What looking at the result takes besides: the platform plugin's own needs come with qt6-base-dev.
-RUN_PACKAGES=(ffmpeg)
+RUN_PACKAGES=(ffmpeg libgl1-mesa-dri)
 # What checking takes besides.
 TEST_PACKAGES=(clang-14 libclang-rt-14-dev clang-format-14 python3 xvfb xauth)

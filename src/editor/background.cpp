@@ -26,6 +26,17 @@ QImage blankPicture(const std::string& programFolder, Host& host) {
     return white;
 }
 
+// In its own size.
+QImage backgroundPicture(const ZephSimulation& simulation, const std::string& programFolder, Host& host) {
+    if (simulation.Background.BackgroundType == kBackgroundPicture) {
+        const QImage picture = loadPicture(QString::fromStdString(backgroundPicturePath(simulation)));
+        if (!picture.isNull()) return picture;
+        host.messageBox(boxTitle("-Picture Load Error"),
+                        "An error occurred while trying to load the background graphic", BoxIcon::Critical);
+    }
+    return blankPicture(programFolder, host);
+}
+
 }  // namespace
 
 std::int32_t brightnessOffset(std::int32_t intensity) noexcept {
@@ -49,9 +60,13 @@ void ZephDrawFastBrightness(std::int32_t offset, QImage& picture) {
     }
 }
 
+QSize canvasSize(const ZephBackground& background) noexcept {
+    return {std::clamp(widthPixels(background), 1, kMaxCanvasPixels),
+            std::clamp(heightPixels(background), 1, kMaxCanvasPixels)};
+}
+
 QImage ZephResizeAndSetBackgroundIntensity(const QImage& picture, const ZephBackground& background) {
-    const QSize canvas(std::clamp(widthPixels(background), 1, kMaxCanvasPixels),
-                       std::clamp(heightPixels(background), 1, kMaxCanvasPixels));
+    const QSize canvas = canvasSize(background);
     QImage stretched =
         picture.size() == canvas ? picture : picture.scaled(canvas, Qt::IgnoreAspectRatio, Qt::SmoothTransformation);
     stretched = stretched.convertToFormat(QImage::Format_RGB32);
@@ -65,13 +80,14 @@ std::string backgroundPicturePath(const ZephSimulation& simulation) {
     return QDir(QString::fromStdString(simulation.FilePath)).filePath(name).toStdString();
 }
 
+QImage ZephGLPicture(const ZephSimulation& simulation, const std::string& programFolder, Host& host) {
+    if (simulation.Background.BackgroundType != kBackgroundPicture) return {};
+    ZephBackground undimmed = simulation.Background;
+    undimmed.PicIntensity = 100;
+    return ZephResizeAndSetBackgroundIntensity(backgroundPicture(simulation, programFolder, host), undimmed);
+}
+
 QImage ZephResetBackground(const ZephSimulation& simulation, const std::string& programFolder, Host& host) {
-    const ZephBackground& background = simulation.Background;
-    if (background.BackgroundType == kBackgroundPicture) {
-        const QImage picture = loadPicture(QString::fromStdString(backgroundPicturePath(simulation)));
-        if (!picture.isNull()) return ZephResizeAndSetBackgroundIntensity(picture, background);
-        host.messageBox(boxTitle("-Picture Load Error"),
-                        "An error occurred while trying to load the background graphic", BoxIcon::Critical);
-    }
-    return ZephResizeAndSetBackgroundIntensity(blankPicture(programFolder, host), background);
+    return ZephResizeAndSetBackgroundIntensity(backgroundPicture(simulation, programFolder, host),
+                                               simulation.Background);
 }

@@ -24,7 +24,7 @@ constexpr std::array<CommandRow, kCommands> kRows{{
     {FileSave, "mnuFileSave", "", File, Action, "&Save", "Ctrl+S", "Save Simulation", "file-save", 3, 0, kGap},
     {FileSaveAs, "mnuFileSaveAs", "", File, Action, "Save &As...", "Ctrl+Shift+S", "Save Simulation As", "file-save-as"},
     {LoadQenReference, "mnuLoadQenReference", "", File, Action, "&Load Reference Channels...", "Ctrl+R", "Load Reference Channels", "reference", 26, 0, kGap},
-    {FileOptions, "mnuFileOptions", "", File, Action, "O&ptions...", "Ctrl+,", "Options", "options", 0, 0},
+    {FileOptions, "mnuFileOptions", "", File, Action, "O&ptions...", "Ctrl+,", "Options", "options", 0, 0, false, kBuilt},
     {FileExit, "mnuFileExit", "", File, Action, "E&xit", "Ctrl+Q", "Exit", "exit", 0, 0, kGap, kBuilt},
 
     {Undo, "mnuUndo", "popUndo", Edit, Action, "Undo", "Ctrl+Z", "Undo", "undo", 20, 0},

@@ -4,6 +4,8 @@
 
 namespace {
 
+constexpr std::string_view kModule = "frmZephMain";
+
 // The document of a running simulation is frozen, and without one there is nothing to choose a tool for.
 bool editable(const ModeContext& context) {
     return context.simulation.SimulationOpen && context.editor.ZephUIState != kStateSimulation;
@@ -44,20 +46,22 @@ bool propFits(const ModeContext& context) {
 
 }  // namespace
 
-void mnuSelect_Click(const ModeContext& context) {
+void mnuSelect_Click(const ModeContext& context) try {
     if (!editable(context) || context.editor.ZephUIState == kStateSelectFixture) return;
     changeTo(kStateSelectFixture, context);
 }
+ZEPH_GUARD(context.failures, kModule, )
 
-void mnuItemTool_Click(const ModeContext& context) {
+void mnuItemTool_Click(const ModeContext& context) try {
     if (!editable(context) || context.editor.ZephUIState == kStateSelectProp) return;
     if (context.editor.ZephChangeToggle != kToggleProps) {
         TogglePropFixtureButtons(kStateSelectProp, context.editor, context.face);
     }
     changeTo(kStateSelectProp, context);
 }
+ZEPH_GUARD(context.failures, kModule, )
 
-void drawTool_Click(int tool, const ModeContext& context) {
+void drawTool_Click(int tool, const ModeContext& context) try {
     ZephEditorState& editor = context.editor;
     if (!editable(context)) return;
     // The only tool with this guard: choosing light strings again goes on with the stroke, choosing another tool again
@@ -71,8 +75,9 @@ void drawTool_Click(int tool, const ModeContext& context) {
     ZephSwitchMode(kModeDrawing, tool, context);
     context.face.CheckEnable(false);
 }
+ZEPH_GUARD(context.failures, kModule, )
 
-void chkCmdFixtureOrProp_MouseUp(int button, bool leftButton, const ModeContext& context) {
+void chkCmdFixtureOrProp_MouseUp(int button, bool leftButton, const ModeContext& context) try {
     const int pressed = context.editor.ZephChangeToggle;
     if (leftButton && editable(context) && button != pressed) {
         context.editor.ZephChangeToggle = button;
@@ -84,8 +89,9 @@ void chkCmdFixtureOrProp_MouseUp(int button, bool leftButton, const ModeContext&
     }
     context.face.showModeButtons();  // the control has changed itself at the click
 }
+ZEPH_GUARD(context.failures, kModule, )
 
-void chkSimplePropMode_Click(bool simple, const ModeContext& context) {
+void chkSimplePropMode_Click(bool simple, const ModeContext& context) try {
     context.editor.SimplePropMode = simple;
     if (!editable(context)) return;
     if (objectSelected(context.editor)) {
@@ -97,3 +103,4 @@ void chkSimplePropMode_Click(bool simple, const ModeContext& context) {
     context.host.setStatusPanel(2, ZephUpdateStatusBarForUIState(context.simulation, context.editor, false));
     context.face.CheckEnable(false);
 }
+ZEPH_GUARD(context.failures, kModule, )

@@ -5,6 +5,7 @@
 
 namespace {
 
+constexpr std::string_view kModule = "modZephEditorFunctions";
 constexpr int kStatePanel = 2;
 
 void showState(const ModeContext& context) {
@@ -38,7 +39,7 @@ void draw(bool fromSimulation, const ModeContext& context) {
 
 }  // namespace
 
-void ZephSwitchMode(int requestedMode, int tool, const ModeContext& context) {
+void ZephSwitchMode(int requestedMode, int tool, const ModeContext& context) try {
     ZephEditorState& editor = context.editor;
     context.face.restoreIfMinimized();
     editor.ZephDrawTool = tool;
@@ -79,6 +80,7 @@ void ZephSwitchMode(int requestedMode, int tool, const ModeContext& context) {
     editor.PressedDrawButton = ToggleDrawBarButtons(requestedMode, tool);
     context.face.showPressedDrawButton();
 }
+ZEPH_GUARD(context.failures, kModule, )
 
 int ToggleDrawBarButtons(int requestedMode, int tool) noexcept {
     switch (requestedMode) {
@@ -100,7 +102,7 @@ void TogglePropFixtureButtons(int mode, ZephEditorState& editor, ModeFace& face)
     face.showModeButtons();
 }
 
-void cancelStroke(const ModeContext& context) {
+void cancelStroke(const ModeContext& context) try {
     ZephEditorState& editor = context.editor;
     CleanUpInProgressFixture(editor.ZephInProgressFixture);
     editor.ZephInProgressAnchor.StartX = -1;
@@ -112,6 +114,7 @@ void cancelStroke(const ModeContext& context) {
     context.face.redrawObjects();
     context.face.CheckEnable(false);
 }
+ZEPH_GUARD(context.failures, kModule, )
 
 void CleanUpInProgressFixture(ZephFixture& inProgress) {
     inProgress = ZephFixture{};

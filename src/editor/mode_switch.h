@@ -4,6 +4,7 @@
 #pragma once
 
 #include "editor/editor_state.h"
+#include "util/failure.h"
 #include "util/host.h"
 
 enum class CanvasPointer { Default, Pencil };
@@ -40,6 +41,7 @@ struct ModeContext {
     Host& host;
     ModeFace& face;
     SimulationDoor& door;
+    FailureReport& failures;
 };
 
 // requestedMode: kStateSimulation, kStateSelectProp, kStateSelectFixture or kModeDrawing; any other value changes the

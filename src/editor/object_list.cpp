@@ -39,7 +39,7 @@ bool listTakesClicks(const ZephSimulation& simulation, const ZephEditorState& ed
     return simulation.SimulationOpen && editor.ZephUIState != kStateSimulation && !drawingInProgress(editor);
 }
 
-void flgObjectSelect_Click(std::int32_t object, const ModeContext& context) {
+void flgObjectSelect_Click(std::int32_t object, const ModeContext& context) try {
     ZephEditorState& editor = context.editor;
     if (!listTakesClicks(context.simulation, editor)) return;
     if (editor.ZephUIState == kStateDrawing) ZephSwitchMode(kStateSelectFixture, editor.ZephDrawTool, context);
@@ -52,3 +52,4 @@ void flgObjectSelect_Click(std::int32_t object, const ModeContext& context) {
     context.host.setStatusPanel(2, ZephUpdateStatusBarForUIState(context.simulation, editor, false));
     context.face.CheckEnable(false);
 }
+ZEPH_GUARD(context.failures, "frmZephMain", )

@@ -46,6 +46,7 @@ void finishMask(BulbMask& mask) {
 void ZephSetUpMasks(const ZephDimmingCurve& curve, const MaskProgress& progress, ZephMasks& masks) {
     SetUpNormalMasks(progress, masks);
     SetUpFloodMasks(curve, progress, masks);
+    ZephGLCreateShapes(masks.GLShapes);
 }
 
 void SetUpNormalMasks(const MaskProgress& progress, ZephMasks& masks) {

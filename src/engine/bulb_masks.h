@@ -2,6 +2,7 @@
 // start-up, before any bulb image, and kept for the program's life: images point at them.
 #pragma once
 
+#include "engine/gl_shapes.h"
 #include "model/dimming_curve.h"
 #include "model/tables.h"
 #include "util/one_based.h"
@@ -35,12 +36,13 @@ struct BulbMask {
 struct ZephMasks {
     OneBased<OneBased<BulbMask, kBulbShapes>, kMaxBulbSize> ZephBulbMasks;  // [size][shape]
     OneBased<BulbMask, kMaxFloodSize> ZephFloodMasks;                       // [size]
+    ZephGLShapes GLShapes;                                                  // what OpenGL draws in place of masks
 };
 
 // Shown on the start-up screen as the work goes on.
 using MaskProgress = std::function<void(std::string_view)>;
 
-// All masks. The curve shapes the glow of floods and must be read before.
+// All masks, and the shapes for OpenGL. The curve shapes the glow of floods and must be read before.
 void ZephSetUpMasks(const ZephDimmingCurve& curve, const MaskProgress& progress, ZephMasks& masks);
 void SetUpNormalMasks(const MaskProgress& progress, ZephMasks& masks);
 void SetUpFloodMasks(const ZephDimmingCurve& curve, const MaskProgress& progress, ZephMasks& masks);

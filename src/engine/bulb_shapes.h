@@ -1,4 +1,4 @@
-// The outlines of the bulb shapes: eight polygons on a grid of 0..32, scaled to each bulb size. The masks are cut from
+// The outlines of the bulb shapes: nine polygons on a grid of 0..32, scaled to each bulb size. The masks are cut from
 // them and the OpenGL output fills them. Coordinates are pixels within the bulb's box, which is twice its size.
 #pragma once
 
@@ -52,6 +52,9 @@ constexpr BulbShapeTable scaled(const ShapeVertex (&grid)[N]) noexcept {
 constexpr BulbShapeTable CreateTriangles() noexcept {
     return bulb_shapes_detail::scaled({{15, 0}, {32, 32}, {0, 32}});
 }
+constexpr BulbShapeTable CreateSquares() noexcept {
+    return bulb_shapes_detail::scaled({{0, 0}, {32, 0}, {32, 32}, {0, 32}});
+}
 constexpr BulbShapeTable CreatePentagons() noexcept {
     return bulb_shapes_detail::scaled({{15, 0}, {32, 13}, {26, 32}, {6, 32}, {0, 13}});
 }
@@ -79,6 +82,7 @@ constexpr BulbShapeTable CreateEightPointStars() noexcept {
 // clang-format on
 
 inline constexpr BulbShapeTable ZephTriangles = CreateTriangles();
+inline constexpr BulbShapeTable ZephSquares = CreateSquares();
 inline constexpr BulbShapeTable ZephPentagons = CreatePentagons();
 inline constexpr BulbShapeTable ZephHexagons = CreateHexagons();
 inline constexpr BulbShapeTable ZephOctagons = CreateOctagons();
@@ -89,7 +93,7 @@ inline constexpr BulbShapeTable ZephStarEight = CreateEightPointStars();
 
 enum class BulbOutline { Ellipse, Rectangle, Polygon };
 
-// Row of the bulb type table -> how it is drawn. table is null but for a polygon.
+// Row of the bulb type table -> how it is drawn. Table is null for an ellipse.
 struct BulbShapeRow {
     BulbOutline Outline;
     const BulbShapeTable* Table;
@@ -97,7 +101,7 @@ struct BulbShapeRow {
 inline constexpr std::array<BulbShapeRow, kBulbShapes> kBulbShapeRows{{
     {BulbOutline::Ellipse, nullptr},         // Round
     {BulbOutline::Polygon, &ZephTriangles},  // Triangle
-    {BulbOutline::Rectangle, nullptr},       // Square
+    {BulbOutline::Rectangle, &ZephSquares},  // Square
     {BulbOutline::Polygon, &ZephPentagons},  // Pentagon
     {BulbOutline::Polygon, &ZephHexagons},   // Hexagon
     {BulbOutline::Polygon, &ZephOctagons},   // Octagon

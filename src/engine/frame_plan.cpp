@@ -1,6 +1,7 @@
 #include "engine/frame_plan.h"
 
 #include "engine/bulb_walk.h"
+#include "engine/paint_order.h"
 
 #include <algorithm>
 #include <map>
@@ -9,10 +10,6 @@
 
 namespace {
 
-std::size_t channelSlot(std::int32_t fixture, std::int32_t channel) noexcept {
-    return static_cast<std::size_t>(fixture * (kMaxChannels + 1) + channel);
-}
-
 // Collects units in the order in which the render cycle calls for them.
 class PlanBuilder {
 public:
@@ -20,36 +17,18 @@ public:
                 const ZephMasks& masks, const ZephStaticBulbs& bulbs, FramePlan& plan)
         : document_(document), tables_(tables), states_(states), masks_(masks), bulbs_(bulbs), plan_(plan) {
         plan_.Units.resize(1);
-        plan_.UnitOfChannel.assign(channelSlot(kMaxFixtures + 1, 0), 0);
+        plan_.UnitOfChannel.assign(kChannelSlots, 0);
         plan_.UnitOfGroup.assign(tables.RGBData.size(), 0);
     }
 
-    // Level by level, the plain channels before the groups.
     void addAll() {
-        for (std::int32_t level = 1; level <= kLevels; ++level) {
-            forEachSlot(level, [&](const ZephRenderSlot& slot) {
-                if (!slot.isRGB() && slot.KeshMagic == 0) addChannel(slot.Fixture, slot.Channel);
-            });
-            forEachSlot(level, [&](const ZephRenderSlot& slot) {
-                if (slot.isRGB()) addGroup(slot.Fixture, slot.RGBIndex);
-            });
-        }
+        forEachUnitPainted(
+            tables_, [&](std::int32_t fixture, std::int32_t channel) { addChannel(fixture, channel); },
+            [&](std::int32_t fixture, std::int32_t rgbIndex) { addGroup(fixture, rgbIndex); });
     }
 
 private:
-    template <typename Visit>
-    void forEachSlot(std::int32_t level, Visit visit) const {
-        for (const ZephRenderData& entry : tables_.RenderData) {
-            if ((entry.LevelUsed >> level & 1U) == 0) continue;
-            for (std::int32_t s = 0; s < entry.SlotCount; ++s) {
-                const ZephRenderSlot& slot = tables_.Slots[static_cast<std::size_t>(entry.FirstSlot + s)];
-                if (slot.Level == level) visit(slot);
-            }
-        }
-    }
-
     void addChannel(std::int32_t fixture, std::int32_t channel) {
-        if (!OneBased<ZephFixture, kMaxFixtures>::contains(fixture) || channel < 1 || channel > kMaxChannels) return;
         std::int32_t& number = plan_.UnitOfChannel[channelSlot(fixture, channel)];
         if (number != 0) return;
         number = addUnit(fixture, channel);
@@ -70,7 +49,6 @@ private:
     }
 
     void addGroup(std::int32_t fixture, std::int32_t rgbIndex) {
-        if (!OneBased<ZephFixture, kMaxFixtures>::contains(fixture)) return;
         std::int32_t& number = plan_.UnitOfGroup.at(static_cast<std::size_t>(rgbIndex));
         if (number != 0) return;
         number = addUnit(fixture, 0);

@@ -132,7 +132,7 @@ void ZephUpdateRGBChannelBulb(const ZephFixture& fixture, std::int32_t color, co
                               ZephRGBBulbCache& cache, RGBBulbPool& pool, ZephRGBData& group) {
     const BulbMask* mask = maskOf(masks, fixture);
     if (mask == nullptr) return;  // sizes and shapes without a mask have no place in the cache either
-    const std::int32_t shape = fixture.Fixture_Type == kFixtureFlood ? kFloodShapeKey : fixture.BulbShape;
+    const std::int32_t shape = shapeDrawn(fixture);
     if (const std::int32_t entry = cache.find(color, fixture.BulbSize, shape); entry != 0) {
         pool.hold(cache[entry].Bulb);
         pool.release(group.Bulb);

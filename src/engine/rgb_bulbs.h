@@ -10,7 +10,6 @@
 #include <vector>
 
 inline constexpr int kRGBBulbCacheSize = 128;
-inline constexpr std::int32_t kFloodShapeKey = 12;  // stands for the shape of a flood, after the bulb types
 inline constexpr std::int32_t kRGBRebuildDrift = 30;
 
 struct ZephRGBBulbCacheEntry {

@@ -1,5 +1,7 @@
 #include "engine/standard_surface.h"
 
+#include "engine/paint_order.h"
+
 #include <algorithm>
 
 namespace {
@@ -132,8 +134,7 @@ void StandardSurface::drawChannel(const ChannelDraw& draw) {
         draw.Channel < 1 || draw.Channel > kMaxChannels) {
         return;
     }
-    const std::int32_t unit =
-        plan_.UnitOfChannel[static_cast<std::size_t>(draw.Fixture * (kMaxChannels + 1) + draw.Channel)];
+    const std::int32_t unit = plan_.UnitOfChannel[channelSlot(draw.Fixture, draw.Channel)];
     const PlanUnit& planned = plan_.Units[static_cast<std::size_t>(unit)];
     if (planned.SpriteCount == 0) return;
     noteUnit(unit, draw.Alpha);

@@ -1,10 +1,13 @@
 #include "shell/command_icons.h"
 
+#include "shell/window_host.h"
+
 #include <QApplication>
 #include <QFile>
 #include <QIconEngine>
 #include <QPainter>
 #include <QPalette>
+#include <QPixmapCache>
 #include <QSvgRenderer>
 
 // Outside every namespace, as the macro asks: pictures inside a static library are dropped unless they are named.
@@ -30,35 +33,51 @@ QByteArray readDrawing(std::string_view name) {
 
 class DrawingEngine : public QIconEngine {
 public:
-    DrawingEngine(QByteArray drawing, const QColor& bar) : drawing_(std::move(drawing)), bar_(bar) {}
+    DrawingEngine(std::string_view name, const QColor& bar)
+        : name_(toQString(name)), drawing_(readDrawing(name)), bar_(bar) {}
 
     void paint(QPainter* painter, const QRect& rect, QIcon::Mode mode, QIcon::State) override {
         if (drawing_.isEmpty()) return;
-        const bool disabled = mode == QIcon::Disabled;
-        const QColor ink =
-            QApplication::palette().color(disabled ? QPalette::Disabled : QPalette::Active,
-                                          mode == QIcon::Selected ? QPalette::HighlightedText : QPalette::ButtonText);
+        const QColor ink = inkOf(mode);
         QByteArray inked = drawing_;
         inked.replace("currentColor", ink.name().toLatin1());
         QSvgRenderer renderer(inked);
         QRectF field(rect);
-        if (bar_.isValid()) field.setSize(field.size() * kShrunkField);
-        if (bar_.isValid()) field.moveLeft(field.left() + rect.width() * (1 - kShrunkField) / 2);
+        if (bar_.isValid()) {
+            field.setSize(field.size() * kShrunkField);
+            field.moveLeft(field.left() + rect.width() * (1 - kShrunkField) / 2);
+        }
         renderer.render(painter, field);
-        if (bar_.isValid()) paintBar(*painter, rect, disabled, ink);
+        if (bar_.isValid()) paintBar(*painter, rect, mode == QIcon::Disabled, ink);
     }
 
+    // The bars repaint often and the vector files are text: each picture is drawn once per size and ink.
     QPixmap pixmap(const QSize& size, QIcon::Mode mode, QIcon::State state) override {
-        QPixmap drawn(size);
+        const QString key = QString("%1 %2 %3 %4x%5 %6")
+                                .arg(name_, inkOf(mode).name(), bar_.isValid() ? bar_.name() : QString())
+                                .arg(size.width())
+                                .arg(size.height())
+                                .arg(mode);
+        QPixmap drawn;
+        if (QPixmapCache::find(key, &drawn)) return drawn;
+        drawn = QPixmap(size);
         drawn.fill(Qt::transparent);
         QPainter painter(&drawn);
         paint(&painter, QRect(QPoint(), size), mode, state);
+        painter.end();
+        QPixmapCache::insert(key, drawn);
         return drawn;
     }
 
     QIconEngine* clone() const override { return new DrawingEngine(*this); }
 
 private:
+    static QColor inkOf(QIcon::Mode mode) {
+        return QApplication::palette().color(mode == QIcon::Disabled ? QPalette::Disabled : QPalette::Active,
+                                             mode == QIcon::Selected ? QPalette::HighlightedText
+                                                                     : QPalette::ButtonText);
+    }
+
     void paintBar(QPainter& painter, const QRect& rect, bool disabled, const QColor& ink) const {
         const double unit = rect.height() / static_cast<double>(kField);
         const QRectF bar(rect.left() + unit, rect.top() + kBarFrom * unit, rect.width() - 2 * unit,
@@ -71,6 +90,7 @@ private:
         painter.setOpacity(1.0);
     }
 
+    QString name_;
     QByteArray drawing_;
     QColor bar_;  // not valid = none
 };
@@ -78,11 +98,11 @@ private:
 }  // namespace
 
 QIcon commandIcon(std::string_view name) {
-    return QIcon(new DrawingEngine(readDrawing(name), QColor()));
+    return QIcon(new DrawingEngine(name, QColor()));
 }
 
 QIcon colorIcon(std::string_view name, const QColor& color) {
-    return QIcon(new DrawingEngine(readDrawing(name), color));
+    return QIcon(new DrawingEngine(name, color));
 }
 
 QCursor pencilPointer(double devicePixelRatio) {

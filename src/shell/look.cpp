@@ -5,6 +5,7 @@
 #include <QPalette>
 #include <QProxyStyle>
 #include <QStyleFactory>
+#include <QStyleOption>
 
 namespace {
 
@@ -20,14 +21,54 @@ const Tones kLightTones{{240, 240, 241}, {32, 33, 36},    {150, 152, 157}, {255,
                         {228, 229, 231}, {203, 204, 208}, {176, 178, 183}, {255, 255, 255}, {255, 255, 255},
                         {32, 33, 36},    {201, 124, 18},  {255, 255, 255}};
 
-// Disabled text without the bright edge below it, which on a dark ground is brighter than the text.
-class PlainDisabledText : public QProxyStyle {
+// Fusion, corrected for dark grounds: its boxes to tick have borders darker than the window, and its disabled text a
+// bright edge that is brighter than the text.
+class ReadableFusion : public QProxyStyle {
 public:
     using QProxyStyle::QProxyStyle;
+
     int styleHint(StyleHint hint, const QStyleOption* option, const QWidget* widget,
                   QStyleHintReturn* returned) const override {
         if (hint == SH_EtchDisabledText) return 0;
         return QProxyStyle::styleHint(hint, option, widget, returned);
+    }
+
+    void drawPrimitive(PrimitiveElement element, const QStyleOption* option, QPainter* painter,
+                       const QWidget* widget) const override {
+        if (element != PE_IndicatorCheckBox && element != PE_IndicatorRadioButton) {
+            QProxyStyle::drawPrimitive(element, option, painter, widget);
+            return;
+        }
+        const bool round = element == PE_IndicatorRadioButton;
+        const bool enabled = option->state.testFlag(State_Enabled);
+        const bool on = option->state.testFlag(State_On);
+        const QPalette& palette = option->palette;
+        const QColor border =
+            palette.color(option->state.testFlag(State_HasFocus) ? QPalette::Highlight : QPalette::PlaceholderText);
+        const QRectF box = QRectF(option->rect).adjusted(0.5, 0.5, -0.5, -0.5);
+        painter->save();
+        painter->setRenderHint(QPainter::Antialiasing);
+        painter->setOpacity(enabled ? 1.0 : 0.45);
+        painter->setPen(on ? palette.color(QPalette::Highlight) : border);
+        painter->setBrush(palette.color(on ? QPalette::Highlight : QPalette::Base));
+        const double radius = round ? box.width() / 2 : 3;
+        painter->drawRoundedRect(box, radius, radius);
+        if (on) drawMark(*painter, box, round, palette.color(QPalette::HighlightedText));
+        painter->restore();
+    }
+
+private:
+    static void drawMark(QPainter& painter, const QRectF& box, bool round, const QColor& ink) {
+        const double unit = box.width() / 12;
+        const auto at = [&](double x, double y) { return box.topLeft() + QPointF(x, y) * unit; };
+        if (round) {
+            painter.setPen(Qt::NoPen);
+            painter.setBrush(ink);
+            painter.drawEllipse(box.center(), 2.5 * unit, 2.5 * unit);
+            return;
+        }
+        painter.setPen(QPen(ink, 1.75 * unit, Qt::SolidLine, Qt::RoundCap, Qt::RoundJoin));
+        painter.drawPolyline(QPolygonF{{at(2.7, 6.3), at(5, 8.6), at(9.3, 3.6)}});
     }
 };
 
@@ -62,7 +103,6 @@ QString styleSheetOf(const Tones& tones) {
     return QString("QToolTip { border: 1px solid %3; padding: 4px; }"
                    "QStatusBar::item { border: none; }"
                    "QStatusBar QLabel { padding: 2px 8px; }"
-                   "QStatusBar #StatusBar1Panel2, #StatusBar1Panel3, #StatusBar1Panel4 { border-left: 1px solid %3; }"
                    "QToolBar { border: none; spacing: 1px; padding: 0px; }"
                    "QToolBar::separator { background: %3; width: 1px; margin: 4px 4px; }"
                    "QToolButton { border: 1px solid transparent; border-radius: 5px; padding: 2px; }"
@@ -106,7 +146,7 @@ QIcon simulationIcon() {
 
 void applyLook(QApplication& application) {
     const Tones& tones = qEnvironmentVariable("ZEPH_LOOK") == "light" ? kLightTones : kDarkTones;
-    application.setStyle(new PlainDisabledText(QStyleFactory::create("Fusion")));
+    application.setStyle(new ReadableFusion(QStyleFactory::create("Fusion")));
     application.setPalette(paletteOf(tones));
     application.setStyleSheet(styleSheetOf(tones));
 }

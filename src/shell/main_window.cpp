@@ -3,6 +3,9 @@
 #include "shell/main_window.h"
 
 #include "editor/canvas_drawing.h"
+#include "engine/dialogs/opengl_window.h"
+#include "model/editor_elements.h"
+#include "model/editor_writer.h"
 #include "shell/recent_files.h"
 #include "shell/startup.h"
 
@@ -33,12 +36,6 @@ frmZephMain::frmZephMain(Program& program, WindowHost& host) : program_(program)
     };
     qApp->installEventFilter(this);
     placeAtStart();
-    UpdateRecentFileMenu();
-    program_.editor.SimplePropMode = program_.settings.SimplePropDisplay;
-    program_.editor.PressedDrawButton = ToggleDrawBarButtons(program_.editor.ZephUIState, 0);
-    showModeButtons();
-    CheckEnable(true);
-    CoolBar1_->band().show(ZephSetOptionsToolbandStuff(program_.settings, *program_.simulation));
 }
 
 frmZephMain::~frmZephMain() {
@@ -47,10 +44,32 @@ frmZephMain::~frmZephMain() {
     program_.seams.socket.connectionRequest = nullptr;
 }
 
+void frmZephMain::setUpToolBars() {
+    program_.editor.PressedDrawButton = ToggleDrawBarButtons(program_.editor.ZephUIState, 0);
+    showModeButtons();
+}
+
+void frmZephMain::setUpMenus() {
+    UpdateRecentFileMenu();
+    CheckEnable(true);
+    CoolBar1_->band().show(ZephSetOptionsToolbandStuff(program_.settings, *program_.simulation));
+}
+
 void frmZephMain::start() {
-    show();
+    constexpr int kMaximised = 2;
+    if (program_.settings.State == kMaximised) {
+        showMaximized();
+    } else {
+        show();
+    }
     host_.pumpEvents();
-    if (!program_.parms.FileToOpen.empty()) openFile(QString::fromStdString(program_.parms.FileToOpen), true);
+    toolBands_ = ZephInitializeFromRegistryCoolbar(program_.seams.store, program_.failures);
+    CoolBar1_->arrange(toolBands_);
+    ZephOpenFirst(*this, program_);
+}
+
+bool frmZephMain::openCommandLineFile(const std::string& file) {
+    return openFile(QString::fromStdString(file), true);
 }
 
 void frmZephMain::requestEnd() {
@@ -65,7 +84,11 @@ void frmZephMain::tick() {
     // The tick lets waiting events run, and the timer's next event may be among them.
     if (inTick_ || !program_.simulating()) return;
     inTick_ = true;
-    hrTimer1_Timer([this] { canvas_->picMain().showChanged(program_.surface.changedRects()); }, program_, *this);
+    hrTimer1_Timer(
+        [this] {
+            if (!program_.rendersOpenGL()) canvas_->picMain().showChanged(program_.surface.changedRects());
+        },
+        program_, *this);
     inTick_ = false;
     if (endRequested_) {
         endRequested_ = false;
@@ -78,27 +101,47 @@ void frmZephMain::tick() {
 }
 
 void frmZephMain::dataArrived() {
-    const bool openGl = program_.RenderEngine == kEngineOpenGL;
+    constexpr qint64 kSequencePauseMs = 2000;  // text after a pause of this length begins a sequence
+    if (!lastArrival_.isValid() || lastArrival_.elapsed() > kSequencePauseMs) ForceForwardIfSimulating();
+    lastArrival_.start();
+    const bool openGl = program_.rendersOpenGL();
     StatusBar1_->showQueueLength(Winsock1_DataArrival(program_.simulating(), openGl, program_.seams.socket,
                                                       program_.failures, program_.receive));
 }
 
 void frmZephMain::closeEvent(QCloseEvent* event) {
-    if (program_.simulating()) {
-        const bool leave = !program_.settings.EndStopsSimulation;
-        if (inTick_ || !leave) {
-            closeRequested_ = leave;
-            requestEnd();
-            event->ignore();
-            return;
-        }
-        requestEnd();
+    if (inTick_) {
+        // Not under a pass: the tick asks again when it is done.
+        closeRequested_ = true;
+        event->ignore();
+        return;
     }
+    const bool leave = Form_Unload(program_, *this, *this);
+    event->setAccepted(leave);
+    if (leave) QCoreApplication::quit();  // the OpenGL engine hides this window, so being hidden is no reason to quit
+}
+
+bool frmZephMain::saveDocument() {
+    ZephSimulation& simulation = *program_.simulation;
+    if (simulation.FileName.empty() || simulation.FileUpgraded) return false;
+    const EditorFileContext context{program_.settings, program_.paths, host_, program_.failures,
+                                    program_.seams.watcher};
+    if (!ZephSaveVisualizerXML(createdAtNow(), context, simulation)) return false;
+    simulation.SimulationDirty = false;
+    return true;
+}
+
+void frmZephMain::stopTimers() {
     hrTimer1_.stop();
     tmrAdjustBrightness_.stop();
-    program_.seams.socket.Close();
-    ZephGetDataFromStack(program_.seams.socket, program_.failures, program_.receive);
-    event->accept();
+}
+
+QRect frmZephMain::windowPlace() const {
+    return isMaximized() || isMinimized() ? normalGeometry() : QRect(pos(), size());
+}
+
+int frmZephMain::windowState() const {
+    return isMinimized() ? 1 : isMaximized() ? 2 : 0;
 }
 
 void frmZephMain::setTimer(bool on, int intervalMs) {

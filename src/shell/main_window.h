@@ -7,24 +7,34 @@
 #include "shell/command_icons.h"
 #include "shell/load_editor_file.h"
 #include "shell/object_panel.h"
+#include "shell/shutdown.h"
+#include "shell/startup.h"
 #include "shell/status_row.h"
 #include "shell/tool_bars.h"
 #include "shell/viewport.h"
 #include "shell/window_host.h"
 #include "shell/window_keys.h"
 
+#include <QElapsedTimer>
 #include <QMainWindow>
 #include <QTimer>
 
 class QSplitter;
+class frmZephOpenGL;
 
-class frmZephMain : public QMainWindow, private SimulationFace, private FileFace {
+class frmZephMain : public QMainWindow,
+                    private SimulationFace,
+                    private FileFace,
+                    private ShutdownFace,
+                    public StartupFace {
 public:
     frmZephMain(Program& program, WindowHost& host);
     ~frmZephMain() override;
 
-    // Shows the window and opens the file of the command line, if one was named.
+    // Shows the window, restores its bars and opens the first file, if there is one.
     void start();
+    // Brings the window of the simulation to the front if it runs and the setting "Force Simulation Forward" is on.
+    void ForceForwardIfSimulating();
 
     bool openFile(const QString& path, bool quiet);
 
@@ -35,8 +45,9 @@ protected:
 private:
     // Commands
     void runCommand(Command command);
-    void mnuFileLoad_Click();
-    void mnuRecentFiles_Click(int index);
+    void mnuFileLoad_Click() override;
+    void mnuRecentFiles_Click(int index) override;
+    void mnuFileOptions_Click();
     void mnuFileExit_Click();
     void mnuHelpAbout_Click();
     void cmdStop_MouseUp();
@@ -62,6 +73,20 @@ private:
     void showFrames(const QImage& frame) override;
     void SetControlsForSimulation(bool on) override;
     void layOutForEditor() override;
+    GLTarget* ZephCreateRenderWindow() override;
+    void resizeRenderWindow() override;
+    void closeRenderWindow() override;
+    void showMainWindow(bool shown) override;
+    // StartupFace
+    void setUpToolBars() override;
+    void setUpMenus() override;
+    bool openCommandLineFile(const std::string& file) override;
+    // ShutdownFace
+    bool saveDocument() override;
+    void stopTimers() override;
+    QRect windowPlace() const override;
+    int windowState() const override;
+    ToolBandLayout toolBands() const override { return toolBands_; }
     // FileFace
     void showDocument() override;
     void setTitle(std::string_view windowTitle) override;
@@ -103,5 +128,9 @@ private:
     bool inTick_ = false;          // a tick that arrives meanwhile does nothing
     bool endRequested_ = false;    // end the simulation once the tick under way is done
     bool closeRequested_ = false;  // and close the window then
-    QRect editorPlace_;            // while simulating: the window as it was before
+    ToolBandLayout toolBands_;
+    std::unique_ptr<frmZephOpenGL> frmZephOpenGL_;  // while the OpenGL engine simulates
+    std::optional<QPoint> renderWindowPlace_;       // where it was closed last
+    QElapsedTimer lastArrival_;                     // of text on the data link
+    QRect editorPlace_;                             // while simulating: the window as it was before
 };

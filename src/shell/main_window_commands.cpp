@@ -2,6 +2,7 @@
 #include "editor/background.h"
 #include "model/data_directories.h"
 #include "shell/dialogs/about_dialog.h"
+#include "shell/edit_options.h"
 #include "shell/main_window.h"
 #include "shell/recent_files.h"
 
@@ -14,6 +15,7 @@
 namespace {
 
 constexpr int kEditorFolder = 1;
+constexpr std::string_view kModule = "frmZephMain";
 
 // Clipboard and undo stores are not there yet; what depends on them is computed as with empty ones.
 CommandInputs commandInputs(const Program& program) {
@@ -26,6 +28,9 @@ void frmZephMain::runCommand(Command command) {
     switch (command) {
     case Command::FileLoad:
         mnuFileLoad_Click();
+        break;
+    case Command::FileOptions:
+        mnuFileOptions_Click();
         break;
     case Command::FileExit:
         mnuFileExit_Click();
@@ -72,7 +77,7 @@ bool frmZephMain::mayLoad(std::string_view titleSuffix) {
                             BoxIcon::Question, BoxButtons::YesNo) == BoxAnswer::Yes;
 }
 
-void frmZephMain::mnuFileLoad_Click() {
+void frmZephMain::mnuFileLoad_Click() try {
     if (mayLoad("-Load?")) {
         const QString folder =
             QString::fromStdString(ZephReturnDataDirectory(kEditorFolder, program_.paths, program_.settings));
@@ -82,18 +87,43 @@ void frmZephMain::mnuFileLoad_Click() {
     }
     CheckEnable(false);
 }
+ZEPH_GUARD(program_.failures, kModule, )
 
-void frmZephMain::mnuRecentFiles_Click(int index) {
+void frmZephMain::mnuRecentFiles_Click(int index) try {
     const std::string file = program_.settings.RecentFiles.at(static_cast<std::size_t>(index));
     if (mayLoad("-Load Recent File?")) openFile(QString::fromStdString(file), false);
     CheckEnable(false);
 }
+ZEPH_GUARD(program_.failures, kModule, )
 
 void frmZephMain::UpdateRecentFileMenu() {
     QStringList captions;
     for (const std::string& caption : ZephRecentFileCaptions(program_.settings, program_.paths))
         captions.append(QString::fromStdString(caption));
     commands_->showRecentFiles(captions);
+}
+
+void frmZephMain::mnuFileOptions_Click() {
+    program_.editor.ZephSelection.Object = 0;
+    ZephDeselectflg();
+    redrawObjects();
+    host_.setStatusPanel(2, ZephUpdateStatusBarForUIState(*program_.simulation, program_.editor, false));
+    CheckEnable(false);
+    const OptionsOutcome outcome =
+        ZephEditOptions(registryContext(program_), this, program_.settings, program_.connection, program_.adapters);
+    if (outcome == OptionsOutcome::Kept) return;
+    // What shows at once.
+    program_.editor.SimplePropMode = program_.settings.SimplePropDisplay;
+    program_.RenderEngine = renderEngineOf(program_.settings);
+    if (outcome == OptionsOutcome::Reset) {
+        toolBands_ = ZephInitializeFromRegistryCoolbar(program_.seams.store, program_.failures);
+        CoolBar1_->arrange(toolBands_);
+        UpdateRecentFileMenu();
+    }
+    ZephLoadUIObjectList();
+    redrawObjects();
+    CoolBar1_->band().show(ZephSetOptionsToolbandStuff(program_.settings, *program_.simulation));
+    CheckEnable(false);
 }
 
 void frmZephMain::mnuFileExit_Click() {
@@ -116,7 +146,7 @@ void frmZephMain::sldIntensity_Scroll() {
 }
 
 // The picture is made anew once the slider has stood still for a whole interval.
-void frmZephMain::tmrAdjustBrightness_Timer() {
+void frmZephMain::tmrAdjustBrightness_Timer() try {
     const int intensity = CoolBar1_->band().intensity();
     if (intensity != lastIntensity_) {
         lastIntensity_ = intensity;
@@ -129,6 +159,7 @@ void frmZephMain::tmrAdjustBrightness_Timer() {
         ZephResetBackground(*program_.simulation, program_.seams.programFolder, program_.seams.host);
     redrawObjects();
 }
+ZEPH_GUARD(program_.failures, kModule, )
 
 void frmZephMain::restoreIfMinimized() {
     if (isMinimized()) showNormal();
@@ -155,10 +186,11 @@ void frmZephMain::ZephDeselectflg() {
     objects_->ZephDeselectflg();
 }
 
-void frmZephMain::ZephLoadUIObjectList() {
+void frmZephMain::ZephLoadUIObjectList() try {
     objects_->showRows(ZephListIndex(*program_.simulation, program_.editor));
     objects_->showSimplePropMode(program_.editor.SimplePropMode, program_.editor.ZephUIState == kStateSelectProp);
 }
+ZEPH_GUARD(program_.failures, kModule, )
 
 void frmZephMain::showPressedDrawButton() {
     for (const CommandRow& row : kCommandTable) {
@@ -171,7 +203,7 @@ void frmZephMain::showModeButtons() {
     objects_->showModeButtons(program_.editor.ZephChangeToggle);
 }
 
-void frmZephMain::CheckEnable(bool forceEnable) {
+void frmZephMain::CheckEnable(bool forceEnable) try {
     const CommandInputs inputs = commandInputs(program_);
     ::CheckEnable(forceEnable, inputs, states_);
     SetEditToolBarTips(*program_.simulation, program_.editor, inputs.undo, "", "", texts_);
@@ -182,6 +214,7 @@ void frmZephMain::CheckEnable(bool forceEnable) {
     objects_->setModeButtonsEnabled(program_.simulation->SimulationOpen && !frozen);
     objects_->showSimplePropMode(program_.editor.SimplePropMode, program_.editor.ZephUIState == kStateSelectProp);
 }
+ZEPH_GUARD(program_.failures, kModule, )
 
 bool frmZephMain::eventFilter(QObject* watched, QEvent* event) {
     if (event->type() != QEvent::KeyPress && event->type() != QEvent::ShortcutOverride) {
@@ -211,7 +244,7 @@ bool frmZephMain::keyDown(const QKeyEvent& event) {
     return true;
 }
 
-void frmZephMain::carryOut(const KeyAnswer& answer) {
+void frmZephMain::carryOut(const KeyAnswer& answer) try {
     switch (answer.action) {
     case KeyAction::StopSimulation:
         requestEnd();
@@ -234,6 +267,7 @@ void frmZephMain::carryOut(const KeyAnswer& answer) {
         break;
     }
 }
+ZEPH_GUARD(program_.failures, kModule, )
 
 void frmZephMain::moveListRow(bool backward) {
     if (objects_->rows() < 1) return;

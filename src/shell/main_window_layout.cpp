@@ -1,5 +1,7 @@
 // The main window's controls and their places: building them, and changing between the two faces.
 #include "shell/main_window.h"
+#include "shell/sequencer_control.h"
+#include "shell/window_place.h"
 #include "util/units.h"
 
 #include <QGuiApplication>
@@ -42,6 +44,12 @@ void frmZephMain::build() {
 
 void frmZephMain::connectControls() {
     StatusBar1_->cmdStop_MouseUp = [this] { cmdStop_MouseUp(); };
+    StatusBar1_->cmdSEPlay_MouseUp = [this] {
+        tellSequencer(SequencerCommand::Start, program_.seams.store, program_.failures);
+    };
+    StatusBar1_->cmdSEStop_MouseUp = [this] {
+        tellSequencer(SequencerCommand::Stop, program_.seams.store, program_.failures);
+    };
     CoolBar1_->band().sldIntensity_Scroll = [this](int) { sldIntensity_Scroll(); };
     objects_->flgObjectSelect_Click = [this](int row) {
         flgObjectSelect_Click(objects_->objectOfRow(row), modes_.context());
@@ -56,10 +64,9 @@ void frmZephMain::connectControls() {
 
 void frmZephMain::placeAtStart() {
     setMinimumSize(kLeastWidthTwips / TwipsPerPixelX, kLeastHeightTwips / TwipsPerPixelY);
-    const QSize wished(program_.settings.Width / TwipsPerPixelX, program_.settings.Height / TwipsPerPixelY);
-    const QRect room = QGuiApplication::primaryScreen()->availableGeometry();
-    resize(wished.boundedTo(room.size()));
-    move(room.topLeft() + QPoint(program_.settings.Left / TwipsPerPixelX, program_.settings.Top / TwipsPerPixelY));
+    const QRect place = ZephWindowPlace(program_.settings, QGuiApplication::primaryScreen()->availableGeometry());
+    move(place.topLeft());
+    resize(place.size());
 }
 
 void frmZephMain::showQueueGauge(bool shown) {

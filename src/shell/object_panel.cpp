@@ -37,8 +37,8 @@ ObjectPanel::ObjectPanel(QWidget* parent) : QWidget(parent) {
     flgObjectSelect_->horizontalHeader()->setSectionResizeMode(QHeaderView::Stretch);
     flgObjectSelect_->verticalHeader()->hide();
     flgObjectSelect_->verticalHeader()->setSectionResizeMode(QHeaderView::Fixed);
-    flgObjectSelect_->setSelectionMode(QAbstractItemView::SingleSelection);
-    flgObjectSelect_->setSelectionBehavior(QAbstractItemView::SelectRows);
+    // The highlight is what the editor has selected; a right press or a drag over the rows must not move it.
+    flgObjectSelect_->setSelectionMode(QAbstractItemView::NoSelection);
     flgObjectSelect_->setEditTriggers(QAbstractItemView::NoEditTriggers);
     flgObjectSelect_->setHorizontalScrollBarPolicy(Qt::ScrollBarAlwaysOff);
     flgObjectSelect_->setVerticalScrollMode(QAbstractItemView::ScrollPerPixel);
@@ -118,8 +118,7 @@ void ObjectPanel::showRows(std::vector<ZephListEntry> rows) {
 }
 
 void ObjectPanel::ZephDeselectflg() {
-    flgObjectSelect_->clearSelection();
-    flgObjectSelect_->setCurrentItem(nullptr);
+    flgObjectSelect_->selectionModel()->clearSelection();
 }
 
 void ObjectPanel::ZephHighlightflg(std::int32_t object) {
@@ -128,13 +127,14 @@ void ObjectPanel::ZephHighlightflg(std::int32_t object) {
 }
 
 int ObjectPanel::highlightedRow() const {
-    const QList<QTableWidgetItem*> selected = flgObjectSelect_->selectedItems();
-    return selected.isEmpty() ? -1 : selected.front()->row();
+    const QModelIndexList selected = flgObjectSelect_->selectionModel()->selectedIndexes();
+    return selected.isEmpty() ? -1 : selected.front().row();
 }
 
 void ObjectPanel::highlightRow(int row) {
-    flgObjectSelect_->setCurrentCell(row, 0);
-    flgObjectSelect_->selectRow(row);
+    const QModelIndex cell = flgObjectSelect_->model()->index(row, 0);
+    flgObjectSelect_->selectionModel()->select(cell, QItemSelectionModel::ClearAndSelect);
+    flgObjectSelect_->scrollTo(cell);
 }
 
 void ObjectPanel::showModeButtons(int pressed) {

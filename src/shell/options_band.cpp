@@ -56,7 +56,7 @@ OptionsBand::OptionsBand(QWidget* parent) : QWidget(parent) {
     sldIntensity_->setObjectName("sldIntensity");
     sldIntensity_->setRange(0, 100);
     sldIntensity_->setPageStep(10);
-    sldIntensity_->setFixedWidth(96);
+    sldIntensity_->setFixedWidth(64);
     sldIntensity_->setFocusPolicy(Qt::NoFocus);
     connect(sldIntensity_, &QSlider::valueChanged, this, [this](int value) {
         sldIntensity_->setToolTip(QString::number(value) + " %");

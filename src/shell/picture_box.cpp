@@ -6,6 +6,7 @@
 PictureBox::PictureBox(QWidget* parent) : QWidget(parent) {
     setAttribute(Qt::WA_OpaquePaintEvent);
     resize(0, 0);
+    hide();  // until there is something to show
 }
 
 void PictureBox::showImage(const QImage& image) {

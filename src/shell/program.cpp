@@ -6,12 +6,12 @@ namespace {
 
 constexpr int kSystemFolder = 7;
 
-std::string logFile(const ZephPathService& paths) {
+}  // namespace
+
+std::string logFileOf(const ZephPathService& paths) {
     return ZephReturnDataDirectory(kSystemFolder, paths, ZephSettings{}) + "errorlog.txt";
 }
 
-}  // namespace
-
 Program::Program(ProgramSeams given, CommandLineParms commandLine)
     : seams(std::move(given)), parms(std::move(commandLine)), paths(seams.dataFolder),
-      failures(logFile(paths), parms.ShowNextError, seams.host), random(seams.seed), sink(tables, seams.clock) {}
+      failures(logFileOf(paths), parms.ShowNextError, seams.host), random(seams.seed), sink(tables, seams.clock) {}

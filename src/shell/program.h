@@ -5,6 +5,7 @@
 #include "editor/editor_state.h"
 #include "engine/bulb_images.h"
 #include "engine/light_commands.h"
+#include "engine/opengl_surface.h"
 #include "engine/render_cycle.h"
 #include "engine/standard_surface.h"
 #include "link/communications.h"
@@ -15,6 +16,7 @@
 #include "util/error_log.h"
 #include "util/paths.h"
 #include "util/random_source.h"
+#include "util/settings_store.h"
 
 #include <QImage>
 
@@ -27,6 +29,7 @@ struct ProgramSeams {
     const Clock& clock;
     SimulationSocket& socket;
     DocumentWatcher& watcher;
+    SettingsStore& store;
     AdapterLister lister;
     std::string dataFolder;     // base of the user's data folders
     std::string programFolder;  // where the blank picture lies
@@ -59,11 +62,16 @@ struct Program {
     SeededRandom random;
     RenderTableSink sink;
     StandardSurface surface;
+    OpenGLSurface glSurface;
 
     Connection connection;
     ZephAdapters adapters;
     ParserSetup parser;
     ReceiveState receive;
 
+    bool rendersOpenGL() const { return RenderEngine == kEngineOpenGL; }
     bool simulating() const { return editor.ZephUIState == kStateSimulation; }
 };
+
+// The log of failures: "errorlog.txt" in the System folder.
+std::string logFileOf(const ZephPathService& paths);

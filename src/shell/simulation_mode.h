@@ -6,6 +6,7 @@
 #include "shell/program.h"
 
 inline constexpr int kStandardTimerMs = 9;
+inline constexpr int kOpenGLTimerMs = 1;
 
 // What the lifecycle asks of the window, besides what every change of mode does. Status texts and boxes go through the
 // host.
@@ -16,6 +17,11 @@ public:
     virtual void showFrames(const QImage& frame) = 0;    // picMain shows this image from here on
     virtual void SetControlsForSimulation(bool on) = 0;
     virtual void layOutForEditor() = 0;
+    // The window of the OpenGL engine: made and shown, or nothing where it cannot be had; and gone again.
+    virtual GLTarget* ZephCreateRenderWindow() = 0;
+    virtual void resizeRenderWindow() = 0;
+    virtual void closeRenderWindow() = 0;
+    virtual void showMainWindow(bool shown) = 0;
 
     void stopTimer() final { setTimer(false, kStandardTimerMs); }
 };
@@ -25,7 +31,9 @@ class ProgramModes final : public SimulationDoor {
 public:
     ProgramModes(Program& program, SimulationFace& face) : program_(program), face_(face) {}
 
-    ModeContext context() { return {*program_.simulation, program_.editor, program_.seams.host, face_, *this}; }
+    ModeContext context() {
+        return {*program_.simulation, program_.editor, program_.seams.host, face_, *this, program_.failures};
+    }
     bool enterSimulation() override;
     void ZephCleanUpAfterSimulation() override;
 

@@ -7,6 +7,17 @@
 #include <QProgressBar>
 #include <QPushButton>
 
+namespace {
+
+QFrame* separator(QWidget* parent) {
+    auto* line = new QFrame(parent);
+    line->setFrameShape(QFrame::VLine);
+    line->setForegroundRole(QPalette::Mid);
+    return line;
+}
+
+}  // namespace
+
 StatusRow::StatusRow(QWidget* parent) : QStatusBar(parent) {
     setObjectName("StatusBar1");
     setSizeGripEnabled(false);
@@ -16,6 +27,7 @@ StatusRow::StatusRow(QWidget* parent) : QStatusBar(parent) {
         panels_[panel]->setObjectName(QString("StatusBar1Panel%1").arg(panel));
         // A long text is cut off rather than widening the window.
         panels_[panel]->setSizePolicy(QSizePolicy::Ignored, QSizePolicy::Preferred);
+        if (panel > 1) addWidget(separator(this));
         addWidget(panels_[panel], kStretch[panel]);
     }
     prbQueueLen_ = new QProgressBar(this);
@@ -74,4 +86,6 @@ void StatusRow::showQueueLength(const QueueGaugeUpdate& update) {
 void StatusRow::showSimulationButtons(bool shown) {
     for (QPushButton* shownButton : {cmdSEPlay_, cmdSEStop_, cmdStop_})
         shownButton->setVisible(shown);
+    cmdSEPlay_->setEnabled(static_cast<bool>(cmdSEPlay_MouseUp));
+    cmdSEStop_->setEnabled(static_cast<bool>(cmdSEStop_MouseUp));
 }

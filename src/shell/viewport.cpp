@@ -3,6 +3,7 @@
 #include "util/rounding.h"
 
 #include <QGridLayout>
+#include <QLabel>
 #include <QScrollBar>
 #include <QSignalBlocker>
 #include <QWheelEvent>
@@ -53,6 +54,9 @@ CanvasViewport::CanvasViewport(QWidget* parent) : QWidget(parent) {
     picMain_ = new PictureBox(picViewport_);
     picMain_->setObjectName("picMain");
     picMain_->setContextMenuPolicy(Qt::CustomContextMenu);
+    hint_ = new QLabel(tr("Open a simulation to begin: File, Open"), picViewport_);
+    hint_->setForegroundRole(QPalette::PlaceholderText);
+    hint_->adjustSize();
     HScroll1_ = new QScrollBar(Qt::Horizontal, this);
     HScroll1_->setObjectName("HScroll1");
     VScroll1_ = new QScrollBar(Qt::Vertical, this);
@@ -96,6 +100,8 @@ void CanvasViewport::layOut() {
     setUpBar(*VScroll1_, picMain_->height(), room.height(), unit_);
     ScrollViewportHoriz();
     ScrollViewportVert();
+    hint_->setVisible(picMain_->isHidden());
+    hint_->move(room.center() - hint_->rect().center());
 }
 
 void CanvasViewport::ScrollViewportHoriz() {

@@ -7,6 +7,7 @@
 
 #include <QFrame>
 
+class QLabel;
 class QScrollBar;
 
 enum class ScrollUnit { Percent, Pixels };
@@ -33,6 +34,7 @@ private:
 
     QFrame* picViewport_ = nullptr;
     PictureBox* picMain_ = nullptr;
+    QLabel* hint_ = nullptr;  // in place of a canvas
     QScrollBar* HScroll1_ = nullptr;
     QScrollBar* VScroll1_ = nullptr;
     ScrollUnit unit_ = ScrollUnit::Percent;

@@ -1,12 +1,14 @@
 #include "util/settings_store.h"
 
-#include "util/failure.h"
+#include "util/settings_file.h"
 
 #include <QStandardPaths>
 
 namespace {
 
 constexpr const char* kFileName = "/settings.ini";
+
+const QSettings::Format kForm = QSettings::registerFormat("ini", readSettingsFile, writeSettingsFile);
 
 QString text(std::string_view utf8) {
     return QString::fromUtf8(utf8.data(), static_cast<qsizetype>(utf8.size()));
@@ -21,22 +23,20 @@ QString fullName(std::string_view key, std::string_view name) {
     return section(key) + '/' + text(name);
 }
 
-std::string statusText(QSettings::Status status, const QString& file) {
-    switch (status) {
-    case QSettings::AccessError:
-        return "the settings in " + file.toStdString() + " cannot be opened";
-    case QSettings::FormatError:
-        return "the settings in " + file.toStdString() + " are damaged; what is legible of them is used";
-    case QSettings::NoError:
-        break;
-    }
-    return "";
-}
-
 }  // namespace
 
-FileSettingsStore::FileSettingsStore(const std::string& file)
-    : file_(text(file), QSettings::IniFormat), problem_(statusText(file_.status(), text(file))) {
+FileSettingsStore::FileSettingsStore(const std::string& file) : file_(text(file), kForm) {
+    if (file_.status() != QSettings::NoError) problem_ = "the settings in " + file + " cannot be opened";
+    for (const QString& name : file_.allKeys()) {
+        if (isIllegibleEntry(name, file_.value(name))) {
+            problem_ = "the settings in " + file + " are damaged; what is legible of them is used";
+        }
+    }
+    listNames();
+}
+
+void FileSettingsStore::listNames() {
+    spelling_.clear();
     for (const QString& name : file_.allKeys())
         spelling_.insert_or_assign(name.toLower(), name);
 }
@@ -51,11 +51,7 @@ std::string FileSettingsStore::userFile() {
 std::optional<std::string> FileSettingsStore::value(std::string_view key, std::string_view name) const {
     const auto found = spelling_.find(fullName(key, name).toLower());
     if (found == spelling_.end()) return std::nullopt;
-    const QVariant stored = file_.value(found->second);
-    // An unquoted comma, as a hand would write it, makes a list.
-    if (stored.metaType() == QMetaType::fromType<QStringList>()) return stored.toStringList().join(',').toStdString();
-    require(stored.metaType() == QMetaType::fromType<QString>(), "the stored value is no text");
-    return stored.toString().toStdString();
+    return file_.value(found->second).toString().toStdString();
 }
 
 void FileSettingsStore::setValue(std::string_view key, std::string_view name, std::string_view value) {
@@ -76,5 +72,6 @@ void FileSettingsStore::removeKey(std::string_view key) {
 
 bool FileSettingsStore::flush() {
     file_.sync();
+    listNames();  // another process may have brought new ones
     return file_.status() == QSettings::NoError;
 }

@@ -20,8 +20,15 @@ struct Outcome {
     QJsonObject json() const { return QJsonDocument::fromJson(out).object(); }
 };
 
-Outcome tool(const QStringList& arguments) {
+Outcome tool(const QStringList& arguments, const QStringList& without = {},
+             const QList<std::pair<QString, QString>>& with = {}) {
     QProcess process;
+    QProcessEnvironment environment = QProcessEnvironment::systemEnvironment();
+    for (const QString& name : without)
+        environment.remove(name);
+    for (const auto& [name, value] : with)
+        environment.insert(name, value);
+    process.setProcessEnvironment(environment);
     process.start(ZEPH_TOOL, arguments);
     EXPECT_TRUE(process.waitForFinished(60'000));
     return {process.exitCode(), process.readAllStandardOutput(), process.readAllStandardError()};
@@ -131,6 +138,40 @@ TEST_F(Tool, RenderDrawsTheFirstFrameAtOrAfterATime) {
     EXPECT_EQ(film.status, 0) << film.err.constData();
     EXPECT_EQ(QDir(path("film")).entryList({"frame*.png"}).size(), 5);
     EXPECT_EQ(QImage(path("film/frame00002.png")).pixel(4, 4), qRgb(255, 255, 255));
+}
+
+// Without a screen: no variable that leads to one is handed on.
+TEST_F(Tool, RenderDrawsThroughOpenGLWithoutAScreen) {
+    const QStringList render{"render", path("roof.zee"), "--capture", path("roof.zcap"), "--engine",
+                             "opengl", "--at",           "15",        "--out",           path("gl.png")};
+    const Outcome run = tool(render, {"DISPLAY", "WAYLAND_DISPLAY"});
+    ASSERT_EQ(run.status, 0) << run.err.constData();
+    const QImage lit(path("gl.png"));
+    EXPECT_EQ(lit.size(), QSize(20, 10));
+    EXPECT_EQ(lit.pixel(4, 4), qRgb(255, 255, 255));
+    EXPECT_EQ(lit.pixel(5, 5), qRgb(255, 255, 255));
+    EXPECT_EQ(lit.pixel(6, 5), qRgb(0, 0, 0));
+    EXPECT_EQ(lit.pixel(14, 4), qRgb(255, 255, 255));
+
+    // Frames at 15, 30 and 45 ms for pictures at 0, 20 and 40; the command that ends at 30 is dark in the last two.
+    const QStringList film{
+        "render", path("roof.zee"), "--capture", path("roof.zcap"), "--engine", "opengl", "--from",
+        "0",      "--to",           "40",        "--fps",           "50",       "--out",  path("gl/")};
+    ASSERT_EQ(tool(film, {"DISPLAY", "WAYLAND_DISPLAY"}).status, 0);
+    EXPECT_EQ(QDir(path("gl")).entryList({"frame*.png"}).size(), 3);
+    EXPECT_EQ(QImage(path("gl/frame00001.png")).pixel(4, 4), qRgb(255, 255, 255));
+    EXPECT_EQ(QImage(path("gl/frame00003.png")).pixel(4, 4), qRgb(0, 0, 0));
+}
+
+TEST_F(Tool, TellsThatThereIsNoOpenGL) {
+    QTemporaryDir nothing;
+    const QStringList render{"render", path("roof.zee"), "--capture", path("roof.zcap"), "--engine",
+                             "opengl", "--at",           "15",        "--out",           path("gl.png")};
+    // The loader of drivers is told to look where there are none.
+    const Outcome run = tool(render, {}, {{"__EGL_VENDOR_LIBRARY_DIRS", nothing.path()}});
+    EXPECT_EQ(run.status, 1);
+    EXPECT_TRUE(run.err.startsWith("zeph-tool: No OpenGL")) << run.err.constData();
+    EXPECT_FALSE(QFile::exists(path("gl.png")));
 }
 
 TEST_F(Tool, ExitsWithOneForBadInputAndTwoForWrongUsage) {

@@ -18,6 +18,7 @@ namespace {
 struct MainWindow : testing::Test {
     void SetUp() override {
         rig.start();
+        rig.startUp(window);
         const auto display = std::make_unique<ZephSimulation>();
         ShellRig::buildDisplay(*display);
         file = rig.save(*display, "bulb.zee");

@@ -6,6 +6,7 @@
 #include "shell/startup.h"
 #include "tests/support/list_socket.h"
 #include "tests/support/loading.h"
+#include "tests/support/map_settings_store.h"
 #include "util/units.h"
 
 struct ShellRig {
@@ -47,15 +48,31 @@ struct ShellRig {
         QImage white(1, 1, QImage::Format_RGB32);
         white.fill(Qt::white);
         white.save(folder.filePath("blank.gif"), "PNG");  // pictures are known by their content
-        ZephStartUp([this](std::string_view text) { steps.emplace_back(text); }, program);
+        store.set("Advanced Render Engine", "False");     // no OpenGL on the platform of these tests
+        EXPECT_TRUE(ZephReadSettingsAtStart(program));
+        startUp(nobodyStarting);
+    }
+    // The steps behind the splash, for a window that stands.
+    void startUp(StartupFace& face) {
+        ZephStartUp([this](std::string_view text) { steps.emplace_back(text); }, face, program);
     }
 
+    struct NobodyStarting : StartupFace {
+        void setUpToolBars() override {}
+        void setUpMenus() override {}
+        void mnuFileLoad_Click() override {}
+        void mnuRecentFiles_Click(int) override {}
+        bool openCommandLineFile(const std::string&) override { return false; }
+    };
+
+    NobodyStarting nobodyStarting;
+    MapSettingsStore store;
     QTemporaryDir folder;
     Host& host;
     ManualClock clock{100'000};
     ListSocket socket;
     NoWatcher nobody;
-    Program program{{host, clock, socket, nobody, [] { return std::vector<ZephAdapter>{}; },
+    Program program{{host, clock, socket, nobody, store, [] { return std::vector<ZephAdapter>{}; },
                      folder.path().toStdString(), folder.path().toStdString(), 1},
                     {}};
     std::vector<std::string> steps;

@@ -2,6 +2,8 @@
 #include "shell/simulation_mode.h"
 #include "tests/shell/shell_rig.h"
 
+#include <gmock/gmock.h>
+
 namespace {
 
 class RecordingFace : public SimulationFace, public FileFace {
@@ -18,6 +20,13 @@ public:
     }
     void SetControlsForSimulation(bool on) override { simulationControls = on; }
     void layOutForEditor() override { simulationControls = false; }
+    GLTarget* ZephCreateRenderWindow() override {
+        ++renderWindows;
+        return nullptr;
+    }
+    void resizeRenderWindow() override {}
+    void closeRenderWindow() override { renderWindows = 0; }
+    void showMainWindow(bool shownNow) override { mainShown = shownNow; }
     void CheckEnable(bool) override {}
     void restoreIfMinimized() override {}
     void eraseRubberBand() override {}
@@ -35,6 +44,8 @@ public:
     bool gauge = false;
     bool simulationControls = false;
     int redraws = 0;
+    int renderWindows = 0;
+    bool mainShown = true;
     const QImage* shown = nullptr;
     std::string title;
 };
@@ -186,4 +197,16 @@ TEST_F(SimulationMode, AFileThatCannotBeOpenedLeavesAnEmptyWindow) {
     ASSERT_EQ(host.boxes.size(), 1U);
     EXPECT_EQ(host.boxes[0].title, "Qen Visualizer-Editor Load Error");
     EXPECT_EQ(face.title, "Qen Visualizer v1.0.0 -bulb.zee");  // the title keeps what it had
+}
+
+TEST_F(SimulationMode, WithoutAnOpenGLContextLeadsBackToAWholeEditor) {
+    rig.program.RenderEngine = kEngineOpenGL;
+    enter();
+    EXPECT_FALSE(rig.program.simulating());
+    EXPECT_FALSE(face.timerOn);
+    EXPECT_TRUE(face.mainShown);
+    EXPECT_EQ(face.renderWindows, 0) << "asked for and closed again";
+    EXPECT_THAT(host.panel2History,
+                testing::IsSupersetOf({"Opening data connection...", "Creating Rendering Window", "Select Fixture"}));
+    EXPECT_FALSE(host.busyPointer);
 }

@@ -36,7 +36,8 @@ constexpr std::array<CommandRow, 8> kCommands{{
      "FOLDER/) [--engine standard|opengl] [--seed N]",
      " --capture --at --from --to --fps --out --engine --seed ", " --capture --out ",
      "Draws the first frame at or after a time as a picture, or a stretch of time as a film through the installed\n"
-     "ffmpeg, or as numbered pictures in a folder."},
+     "ffmpeg, or as numbered pictures in a folder. --engine opengl draws as the OpenGL window does, without a window:\n"
+     "it needs a driver, of a graphics card or in software, but no screen. Exit status 1 where there is none."},
     {"send", "send CAP.zcap [--host 127.0.0.1] [--port 30303] [--tcp] [--loop] [--speed X] [--on-request]",
      " --host --port --tcp --loop --speed --on-request ", "",
      "Plays a capture to a listening simulation in real time, one datagram (UDP) or write (TCP) a piece. --on-request\n"

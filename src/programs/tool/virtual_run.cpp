@@ -7,7 +7,6 @@ VirtualRun::VirtualRun(CompiledDocument& display, Capture capture, const std::st
       curve_(ZephCreateDummyDimmingCurve()) {}
 
 void VirtualRun::run(std::int32_t until, LightSurface& surface, const std::function<bool(std::int32_t)>& onFrame) {
-    const std::int32_t tickMs = engine_ == kEngineOpenGL ? kOpenGLFrameMs : kStandardFrameMs;
     ManualClock clock(kVirtualStartMs);
     ZephRenderClocks clocks = clocksAtEntry(kVirtualStartMs);
     ParserSetup parser;
@@ -22,7 +21,7 @@ void VirtualRun::run(std::int32_t until, LightSurface& surface, const std::funct
     const TickContext tick{clock, parser, document.host, sink, stream, context, frameDone};
 
     std::size_t next = 0;
-    for (std::int32_t t = tickMs; t <= until; t += tickMs) {
+    for (std::int32_t t = tickMs(); t <= until; t += tickMs()) {
         for (; next < capture_.pieces.size() && capture_.pieces[next].timeMs <= t; ++next) {
             stream.ZephStackBuffer.append(capture_.pieces[next].bytes);
         }

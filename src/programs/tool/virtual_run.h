@@ -20,6 +20,8 @@ public:
     // run.
     void run(std::int32_t until, LightSurface& surface, const std::function<bool(std::int32_t)>& onFrame);
 
+    // Time from one tick to the next, each of which draws a frame; the first tick is at t = tickMs.
+    std::int32_t tickMs() const { return engine_ == kEngineOpenGL ? kOpenGLFrameMs : kStandardFrameMs; }
     const ZephDimmingCurve& curve() const { return curve_; }
 
 private:

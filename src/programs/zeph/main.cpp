@@ -1,8 +1,11 @@
 // The window program: puts the parts together and runs the event loop.
 #include "link/qt_simulation_socket.h"
+#include "shell/dialogs/about_dialog.h"
 #include "shell/look.h"
 #include "shell/main_window.h"
+#include "shell/sequencer_control.h"
 #include "shell/startup.h"
+#include "util/fault_log.h"
 
 #include <QAction>
 #include <QApplication>
@@ -28,6 +31,7 @@ CommandLineParms parmsOf(QStringList arguments) {
 int main(int argc, char** argv) {
     QApplication application(argc, argv);
     QApplication::setApplicationName("zeph");
+    QApplication::setQuitOnLastWindowClosed(false);  // the OpenGL engine hides the main window
     applyLook(application);
     QApplication::setWindowIcon(simulationIcon());
 
@@ -35,14 +39,27 @@ int main(int argc, char** argv) {
     const SystemClock clock;
     QtSimulationSocket socket;
     NoWatcher watcher;
-    Program program({host, clock, socket, watcher, listSystemAdapters, ZephPathService::userBase(),
+    FileSettingsStore store(FileSettingsStore::userFile());
+    Program program({host, clock, socket, watcher, store, listSystemAdapters, ZephPathService::userBase(),
                      QApplication::applicationDirPath().toStdString(), seedFromSystem()},
                     parmsOf(QApplication::arguments()));
-    ZephStartUp([](std::string_view) {}, program);
+    if (!ZephReadSettingsAtStart(program)) return 0;
+    installFaultLog(logFileOf(program.paths));
+
     frmZephMain window(program, host);
+    {
+        frmZephAbout splash(frmZephAbout::Purpose::Splash);
+        splash.adjustSize();
+        splash.move(window.geometry().center() - splash.rect().center());
+        splash.show();
+        ZephStartUp([&](std::string_view text) { splash.StartupMessage(text); }, window, program);
+    }
     window.start();
     if (QApplication::arguments().contains(kSimulateSwitch)) {
         window.findChild<QAction*>("mnuSimulationMode")->trigger();
+        tellSequencer(SequencerCommand::Start, store, program.failures);
     }
-    return QApplication::exec();
+    const int result = QApplication::exec();
+    removeFaultLog();
+    return result;
 }

@@ -1,0 +1,259 @@
+#include "editor/command_states.h"
+#include "editor/tool_bar_texts.h"
+#include "tests/editor/editor_rig.h"
+
+#include <cctype>
+#include <map>
+
+namespace {
+
+using enum Command;
+using Commands = std::vector<Command>;
+
+// What the menus offer, without what is always there.
+Commands offered(const CommandStates& states) {
+    Commands found;
+    for (const CommandRow& row : kCommandTable) {
+        const bool always = row.id == None || row.id == FileNew || row.id == FileLoad || row.id == FileOptions ||
+                            row.id == FileExit || row.id == HelpAbout;
+        if (!always && row.kind != CommandKind::Menu && states[row.id].enabled) found.push_back(row.id);
+    }
+    return found;
+}
+
+const Commands kTools{Draw,       DrawKeshs,  DrawFloods,       DrawBulbs,      ArchWizard,
+                      TreeWizard, KeshWizard, KeshMatrixWizard, DrawPixelWizard};
+const Commands kOfDocument{BackgroundProperties, FileSaveAs,   LoadQenReference, FileSave,
+                           InsertFixture,        InsertSymbol, InsertProp,       EditLevels};
+const Commands kOfFixtures{Select, SimulationMode, ItemTool, CreateNewItem};
+const Commands kOfSelection{Cut, CopyObject, DeleteObject, HomeObject};
+
+Commands together(std::initializer_list<Commands> lists) {
+    Commands all;
+    for (const Commands& list : lists)
+        all.insert(all.end(), list.begin(), list.end());
+    std::ranges::sort(all);
+    return all;
+}
+
+}  // namespace
+
+TEST(CheckEnable, WithoutADocumentOffersOnlyFilesOptionsHelpAndExit) {
+    EditorRig rig;
+    rig.simulation->SimulationOpen = false;
+    rig.clipboard = 3;
+    rig.undo = {2, 2};
+    rig.select(kStateSelectFixture, 1);
+    CommandStates states;
+    CheckEnable(false, rig.inputs(), states);
+    EXPECT_EQ(offered(states), Commands{});
+    for (const Command command : {FileNew, FileLoad, FileOptions, FileExit, HelpAbout, File, Edit, Help})
+        EXPECT_TRUE(states[command].enabled) << commandRow(command).name;
+    for (const Command group : {Insert, Order, Toolbox, EditLocks})
+        EXPECT_FALSE(states[group].enabled) << commandRow(group).name;
+    EXPECT_FALSE(states.band.sldIntensity);
+    EXPECT_TRUE(states.band.cmdTextColor);
+}
+
+TEST(CheckEnable, FollowsStateAndSelection) {
+    struct Row {
+        const char* name;
+        int state;
+        int fixture;
+        bool fixtureLocked;
+        bool propLocked;
+        Commands besides;  // what is offered besides the tools and what any document with fixtures offers
+    };
+    const Row rows[] = {
+        {"nothing selected", kStateSelectFixture, 0, false, false, {}},
+        {"middle level", kStateSelectFixture, 1, false, false,
+         together(
+             {kOfSelection, {Lock, SendToForeground, MoveForward, SendToBackground, MoveBackward, ObjectProperties}})},
+        {"top level, locked", kStateSelectFixture, 2, true, false,
+         together({kOfSelection, {Unlock, SendToBackground, MoveBackward, ObjectProperties}})},
+        {"bottom level", kStateSelectFixture, 3, false, true,
+         together({kOfSelection, {Lock, SendToForeground, MoveForward, ObjectProperties}})},
+        {"prop: its lock decides", kStateSelectProp, 3, false, true,
+         together({kOfSelection, {Unlock, ObjectProperties}})},
+        {"prop: not the fixture's lock", kStateSelectProp, 2, true, false,
+         together({kOfSelection, {Lock, ObjectProperties}})},
+        {"lone fixture among props", kStateSelectProp, 1, true, false, together({kOfSelection, {Lock}})},
+        {"drawing", kStateDrawing, 1, false, false, kOfSelection},
+        {"a fixture that is not there", kStateSelectFixture, 99999, false, false,
+         together({kOfSelection, {Lock, SendToForeground, MoveForward, ObjectProperties}})},
+    };
+    for (const Row& row : rows) {
+        EditorRig rig;
+        rig.select(row.state, row.fixture);
+        if (row.fixture >= 1 && row.fixture <= 3) rig.simulation->Fixtures[row.fixture].Locked = row.fixtureLocked;
+        rig.simulation->Props[1].Locked = row.propLocked;
+        CommandStates states;
+        CheckEnable(false, rig.inputs(), states);
+        EXPECT_EQ(offered(states), together({kTools, kOfDocument, kOfFixtures, row.besides})) << row.name;
+        const bool lockable = std::ranges::count(row.besides, Lock) + std::ranges::count(row.besides, Unlock) > 0;
+        EXPECT_EQ(states[EditLocks].enabled, lockable) << row.name;
+        EXPECT_TRUE(states[Order].enabled) << row.name;  // the levels themselves can always be edited
+    }
+}
+
+TEST(CheckEnable, AnEmptyDocumentCanBeDrawnOnButNotSelectedIn) {
+    EditorRig rig;
+    rig.simulation->FixtureCount = 0;
+    CommandStates states;
+    CheckEnable(false, rig.inputs(), states);
+    EXPECT_EQ(offered(states), together({kTools, kOfDocument}));
+}
+
+TEST(CheckEnable, ClipboardAndUndoNeedSomethingToGiveBack) {
+    EditorRig rig;
+    rig.clipboard = 1;
+    rig.undo = {1, 0};
+    CommandStates states;
+    CheckEnable(false, rig.inputs(), states);
+    EXPECT_TRUE(states[PasteObject].enabled);
+    EXPECT_TRUE(states[Undo].enabled);
+    EXPECT_FALSE(states[Redo].enabled);
+    rig.undo = {0, 1};
+    rig.editor.ZephUIState = kStateSimulation;
+    CheckEnable(false, rig.inputs(), states);
+    EXPECT_FALSE(states[Undo].enabled);
+    EXPECT_FALSE(states[Redo].enabled);
+    EXPECT_FALSE(states.band.picToolBarButtonContainer);
+}
+
+TEST(CheckEnable, AStrokeShutsEverythingAndItsEndOpensItAgain) {
+    EditorRig rig;
+    CommandStates states;
+    CheckEnable(true, rig.inputs(), states);
+    const CommandStates before = states;
+    rig.beginStroke();
+    CheckEnable(false, rig.inputs(), states);
+    EXPECT_FALSE(states.toolBars);
+    EXPECT_EQ(std::ranges::count(states.editButtons, true) + std::ranges::count(states.drawButtons, true), 0);
+    EXPECT_FALSE(states[File].visible || states[File].enabled || states[Edit].visible || states[Edit].enabled);
+    EXPECT_TRUE(states[Help].visible);
+    EXPECT_FALSE(states.popContextMenu);
+    EXPECT_EQ(states.band, (OptionsBandState{false, false, false, false, false, false, false, false, false, false}));
+
+    rig.editor = {};
+    CheckEnable(false, rig.inputs(), states);
+    EXPECT_EQ(states, before);
+}
+
+TEST(CheckEnable, AButtonFollowsItsCommand) {
+    EditorRig rig;
+    rig.select(kStateSelectFixture, 2);
+    CommandStates states;
+    CheckEnable(true, rig.inputs(), states);
+    EXPECT_FALSE(states.editButtons[10]);  // forward, from the top level
+    EXPECT_TRUE(states.editButtons[11]);   // backward
+    EXPECT_FALSE(states.editButtons[4]);   // a gap
+    EXPECT_TRUE(states.drawButtons[14]);
+}
+
+TEST(CheckEnable, TheBandHidesNamesOnlyWhereNamesHaveAPlace) {
+    EditorRig rig;
+    OptionsBandState band;
+    OptionsToolbandCheckEnable({*rig.simulation, rig.editor, 0, {}, 0, false}, band);
+    EXPECT_FALSE(band.chkNames);
+    EXPECT_TRUE(band.sldIntensity);
+    OptionsToolbandCheckEnable(rig.inputs(), band);
+    EXPECT_TRUE(band.chkNames);
+}
+
+TEST(CommandTable, HasEveryButtonInItsPlace) {
+    const struct {
+        int index;
+        const char* edit;
+        const char* draw;
+    } rows[] = {{0, "", ""},
+                {1, "mnuFileNew", "mnuSimulationMode"},
+                {4, "", ""},
+                {9, "mnuSendToBackground", ""},
+                {15, "", ""},
+                {18, "mnuPasteObject", "mnuInsertProp"},
+                {21, "mnuRedo", "mnuCreateNewItem"},
+                {26, "mnuLoadQenReference", ""},
+                {27, "", ""}};
+    for (const auto& row : rows) {
+        EXPECT_EQ(commandRow(editButtonCommand(row.index)).name, row.edit) << row.index;
+        EXPECT_EQ(commandRow(drawButtonCommand(row.index)).name, row.draw) << row.index;
+    }
+}
+
+TEST(CommandTable, GivesNoKeyAndNoAcceleratorTwice) {
+    std::vector<std::string_view> keys;
+    std::map<Command, std::string> letters;
+    for (const CommandRow& row : kCommandTable) {
+        if (!row.shortcut.empty()) keys.push_back(row.shortcut);
+        const std::size_t mark = row.caption.find('&');
+        // Two of the drawing tools have the same letter: the menu then goes from one to the other.
+        if (mark == std::string_view::npos || row.id == KeshWizard) continue;
+        const char letter = static_cast<char>(std::toupper(row.caption[mark + 1]));
+        EXPECT_EQ(letters[row.menu].find(letter), std::string::npos) << row.caption;
+        letters[row.menu] += letter;
+    }
+    std::ranges::sort(keys);
+    EXPECT_EQ(std::ranges::adjacent_find(keys), keys.end());
+}
+
+TEST(ToolBarTexts, NameTheLevelAndTheTopOfTheStores) {
+    EditorRig rig;
+    EditToolBarTexts texts;
+    rig.select(kStateSelectFixture, 1);
+    SetEditToolBarTips(*rig.simulation, rig.editor, {1, 0}, "Cut of Wreath", "", texts);
+    EXPECT_EQ(texts.MoveForwardTip, "Move Forward (to level:6)");
+    EXPECT_EQ(texts.MoveBackwardTip, "Move Backward (to level:4)");
+    EXPECT_EQ(texts.UndoTip, "Undo: Cut of Wreath");
+    EXPECT_EQ(texts.UndoCaption, "Undo Cut of Wreath");
+    EXPECT_EQ(texts.RedoTip, "Redo");
+    EXPECT_EQ(texts.ObjectProperties, "Fixture Properties");
+    rig.select(kStateSelectFixture, 2);
+    SetEditToolBarTips(*rig.simulation, rig.editor, {0, 4}, "", "Move", texts);
+    EXPECT_EQ(texts.MoveForwardTip, "Move Forward");
+    EXPECT_EQ(texts.MoveBackwardTip, "Move Backward (to level:15)");
+    EXPECT_EQ(texts.UndoCaption, "Undo");
+    EXPECT_EQ(texts.RedoTip, "Redo: Move");
+    EXPECT_EQ(texts.RedoCaption, "Redo Move");
+    rig.select(kStateSelectProp, 3);
+    SetEditToolBarTips(*rig.simulation, rig.editor, {}, "", "", texts);
+    EXPECT_EQ(texts.MoveForwardTip, "Move Forward");
+    EXPECT_EQ(texts.ObjectProperties, "Prop Properties");
+    rig.editor.ZephUIState = kStateDrawing;
+    SetEditToolBarTips(*rig.simulation, rig.editor, {}, "", "", texts);
+    EXPECT_EQ(texts.ObjectProperties, "Prop Properties");  // a state that selects nothing leaves it
+}
+
+TEST(ToolBarTexts, TellTheStateInPanelTwo) {
+    const struct {
+        int state;
+        int fixture;
+        bool suppress;
+        const char* text;
+    } rows[] = {{kStateSimulation, 0, false, "Simulation Active"},
+                {kStateSelectProp, 0, false, "Select Prop"},
+                {kStateSelectProp, 1, false, "Prop Selected:Wreath"},
+                {kStateSelectProp, 2, true, "Prop Selected:Snowman (arm)"},
+                {kStateSelectFixture, 0, false, "Select Fixture"},
+                {kStateSelectFixture, 3, false, "Fixture Selected:Hat - Layer:1"},
+                {kStateSelectFixture, 3, true, "Select Fixture"},
+                {kStateDrawing, 0, false, "Drawing"}};
+    EditorRig rig;
+    for (const auto& row : rows) {
+        rig.select(row.state, row.fixture);
+        EXPECT_EQ(ZephUpdateStatusBarForUIState(*rig.simulation, rig.editor, row.suppress), row.text);
+    }
+    rig.simulation->SimulationOpen = false;
+    EXPECT_EQ(ZephUpdateStatusBarForUIState(*rig.simulation, rig.editor, false), "");
+}
+
+TEST(ToolBarTexts, TheBandShowsTheDocumentsBrightnessAndThatNamesAreHidden) {
+    EditorRig rig;
+    ZephSettings settings;
+    settings.DisableFixtureText = true;
+    rig.simulation->Background.PicIntensity = 40;
+    EXPECT_EQ(ZephSetOptionsToolbandStuff(settings, *rig.simulation).sldIntensity, 40);
+    EXPECT_TRUE(ZephSetOptionsToolbandStuff(settings, *rig.simulation).chkNames);
+    rig.simulation->SimulationOpen = false;
+    EXPECT_EQ(ZephSetOptionsToolbandStuff(settings, *rig.simulation).sldIntensity, 100);
+}

@@ -1,0 +1,87 @@
+// A small open document and a window that notes what it is asked to show.
+#pragma once
+
+#include "editor/command_states.h"
+#include "editor/mode_switch.h"
+#include "tests/support/recording_host.h"
+
+#include <algorithm>
+#include <memory>
+
+// 1 "Wreath", alone, level 5; 2 "arm" and 3 "Hat" of the prop "Snowman", levels 16 and 1.
+struct EditorRig {
+    EditorRig() {
+        simulation->SimulationOpen = true;
+        simulation->FixtureCount = 3;
+        simulation->PropCount = 1;
+        simulation->Props[1].Name = "Snowman";
+        simulation->Props[1].AssignedCount = 2;
+        simulation->Props[1].Object[1] = 3;
+        simulation->Props[1].Object[2] = 2;
+        const struct {
+            const char* name;
+            int prop;
+            int level;
+        } rows[] = {{"Wreath", 0, 5}, {"arm", 1, 16}, {"Hat", 1, 1}};
+        for (int fixture = 1; fixture <= 3; ++fixture) {
+            ZephFixture& record = simulation->Fixtures[fixture];
+            record.Name = rows[fixture - 1].name;
+            record.AssignedItem = rows[fixture - 1].prop;
+            record.ZOrder = rows[fixture - 1].level;
+        }
+    }
+
+    void select(int state, int fixture) {
+        editor.ZephUIState = state;
+        editor.ZephSelection.Object = fixture;
+    }
+    // A stroke of light strings has begun at (30, 45) and reserved a fixture.
+    void beginStroke() {
+        editor.ZephUIState = kStateDrawing;
+        editor.ZephInProgressAnchor = {30, 45, 30, 45};
+        editor.ZephInProgressIndex = ++simulation->FixtureCount;
+        editor.ZephInProgressFixture.PointCount = 1;
+    }
+    CommandInputs inputs() const { return {*simulation, editor, clipboard, undo, 1, false}; }
+
+    std::unique_ptr<ZephSimulation> simulation = std::make_unique<ZephSimulation>();
+    ZephEditorState editor;
+    std::int32_t clipboard = 0;
+    UndoSummary undo;
+};
+
+class RecordingModeFace : public ModeFace, public SimulationDoor {
+public:
+    explicit RecordingModeFace(ZephEditorState& state) : editor(state) {}
+
+    void restoreIfMinimized() override { calls.push_back("restore"); }
+    void eraseRubberBand() override { calls.push_back("erase"); }
+    void setCanvasPointer(CanvasPointer shown) override { pointer = shown; }
+    void stopTimer() override { calls.push_back("stop timer"); }
+    void redrawObjects() override { calls.push_back("redraw"); }
+    void ZephHighlightflg(std::int32_t object) override { highlighted = object; }
+    void ZephDeselectflg() override { highlighted = 0; }
+    void ZephLoadUIObjectList() override {
+        require(!listFails, "no list");
+        calls.push_back("list");
+    }
+    void showPressedDrawButton() override { pressed = editor.PressedDrawButton; }
+    void showModeButtons() override { modeButton = editor.ZephChangeToggle; }
+    void CheckEnable(bool) override { calls.push_back("enable"); }
+    bool enterSimulation() override {
+        calls.push_back("enter");
+        if (simulationStarts) editor.ZephUIState = kStateSimulation;
+        return simulationStarts;
+    }
+    void ZephCleanUpAfterSimulation() override { calls.push_back("clean up"); }
+    long count(const std::string& call) const { return std::ranges::count(calls, call); }
+
+    ZephEditorState& editor;
+    std::vector<std::string> calls;
+    CanvasPointer pointer = CanvasPointer::Default;
+    int pressed = -1;
+    int modeButton = -1;
+    std::int32_t highlighted = 0;
+    bool simulationStarts = true;
+    bool listFails = false;
+};

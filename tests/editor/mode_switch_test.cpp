@@ -1,0 +1,196 @@
+#include "editor/mode_commands.h"
+#include "editor/object_list.h"
+#include "tests/editor/editor_rig.h"
+
+namespace {
+
+struct Modes : testing::Test {
+    ModeContext context() { return {*rig.simulation, rig.editor, host, face, face, failures}; }
+    void expect(int state, int button, const char* panel) {
+        EXPECT_EQ(rig.editor.ZephUIState, state);
+        EXPECT_EQ(face.pressed, button);
+        EXPECT_EQ(host.panels[2], panel);
+    }
+
+    EditorRig rig;
+    RecordingHost host;
+    CollectingFailures failures;
+    RecordingModeFace face{rig.editor};
+};
+
+}  // namespace
+
+TEST_F(Modes, EachRequestEndsInItsStateWithItsButtonPressed) {
+    const struct {
+        int request;
+        int tool;
+        int state;
+        int button;
+        const char* panel;
+        CanvasPointer pointer;
+    } rows[] = {
+        {kStateSelectProp, 1, kStateSelectProp, 2, "Select Prop", CanvasPointer::Default},
+        {kModeDrawing, kToolLightStrings, kStateDrawing, 5, "Drawing", CanvasPointer::Pencil},
+        {kModeDrawing, kToolBulbs, kStateDrawing, 8, "Drawing", CanvasPointer::Pencil},
+        {kModeDrawing, kToolArchWizard, kStateDrawing, 10, "Drawing", CanvasPointer::Pencil},
+        {kModeDrawing, kToolPixelWizard, kStateDrawing, 14, "Drawing", CanvasPointer::Pencil},
+        {kStateSelectFixture, 3, kStateSelectFixture, 3, "Select Fixture", CanvasPointer::Default},
+        {7, 6, kStateSelectFixture, 0, "Select Fixture", CanvasPointer::Default},  // no mode: only the tool changes
+    };
+    for (const auto& row : rows) {
+        ZephSwitchMode(row.request, row.tool, context());
+        expect(row.state, row.button, row.panel);
+        EXPECT_EQ(rig.editor.ZephDrawTool, row.tool);
+        EXPECT_EQ(face.pointer, row.pointer);
+    }
+    EXPECT_EQ(face.calls.front(), "restore");
+}
+
+TEST_F(Modes, SelectingIgnoresLocksAndKeepsTheSelection) {
+    rig.select(kStateSelectFixture, 2);
+    ZephSwitchMode(kStateSelectProp, 1, context());
+    EXPECT_TRUE(rig.editor.ZephIgnoreLocks);
+    EXPECT_EQ(host.panels[2], "Prop Selected:Snowman (arm)");
+    EXPECT_EQ(face.calls, (std::vector<std::string>{"restore", "stop timer", "redraw", "list"}));
+}
+
+TEST_F(Modes, TheSimulationStandsBehindItsDoor) {
+    ZephSwitchMode(kStateSimulation, 2, context());
+    EXPECT_EQ(rig.editor.ZephUIState, kStateSimulation);
+    EXPECT_EQ(face.pressed, 1);
+    host.panels[2] = "UDP Simulation active";
+    ZephSwitchMode(kStateSelectFixture, 2, context());
+    expect(kStateSelectFixture, 3, "Select Fixture");
+    EXPECT_EQ(face.count("clean up"), 1);
+
+    face.simulationStarts = false;
+    rig.editor.ZephUIState = kStateSelectProp;
+    rig.editor.ZephChangeToggle = kToggleProps;
+    ZephSwitchMode(kStateSimulation, 2, context());
+    expect(kStateSelectFixture, 3, "Select Fixture");
+    EXPECT_EQ(face.modeButton, kToggleFixtures);
+    EXPECT_EQ(face.count("clean up"), 1);
+}
+
+TEST_F(Modes, AFailureIsReportedUnderTheProceduresName) {
+    face.listFails = true;
+    ZephSwitchMode(kStateSelectProp, 1, context());
+    ASSERT_EQ(failures.reports.size(), 1U);
+    EXPECT_EQ(failures.reports[0].procedure, "Zeph.modZephEditorFunctions.ZephSwitchMode");
+    EXPECT_EQ(failures.reports[0].description, "no list");
+}
+
+TEST_F(Modes, LeavingAStrokeGivesItsFixtureBack) {
+    rig.beginStroke();
+    ASSERT_EQ(rig.simulation->FixtureCount, 4);
+    ZephSwitchMode(kStateSelectFixture, 1, context());
+    EXPECT_EQ(rig.simulation->FixtureCount, 3);
+    EXPECT_EQ(rig.editor.ZephInProgressFixture, ZephFixture{});
+    EXPECT_FALSE(strokeActive(rig.editor));
+    EXPECT_EQ(face.calls[1], "erase");
+
+    rig.beginStroke();
+    cancelStroke(context());
+    EXPECT_EQ(rig.simulation->FixtureCount, 3);
+    EXPECT_EQ(rig.editor.ZephUIState, kStateDrawing);
+
+    rig.editor.ZephInProgressAnchor = {0, 0, 90, 90};  // a wizard's box from the upper left corner holds no fixture
+    cancelStroke(context());
+    EXPECT_EQ(rig.simulation->FixtureCount, 3);
+}
+
+TEST_F(Modes, TheModeCommandsDeselectAndFollowTheButtons) {
+    rig.select(kStateSelectFixture, 1);
+    mnuSelect_Click(context());
+    EXPECT_EQ(rig.editor.ZephSelection.Object, 1);  // in its own state it does nothing
+    chkCmdFixtureOrProp_MouseUp(kToggleProps, false, context());
+    EXPECT_EQ(rig.editor.ZephUIState, kStateSelectFixture);
+    chkCmdFixtureOrProp_MouseUp(kToggleProps, true, context());
+    expect(kStateSelectProp, 2, "Select Prop");
+    EXPECT_EQ(face.modeButton, kToggleProps);
+    EXPECT_EQ(rig.editor.ZephSelection.Object, 0);
+
+    rig.editor.ZephSelection.Object = 3;
+    chkCmdFixtureOrProp_MouseUp(kToggleProps, true, context());  // the pressed button stays pressed
+    EXPECT_EQ(rig.editor.ZephSelection.Object, 3);
+    chkCmdFixtureOrProp_MouseUp(kToggleFixtures, true, context());
+    expect(kStateSelectFixture, 3, "Select Fixture");
+
+    mnuItemTool_Click(context());
+    expect(kStateSelectProp, 2, "Select Prop");
+    EXPECT_EQ(face.modeButton, kToggleProps);
+}
+
+TEST_F(Modes, OnlyLightStringsAreNotArmedTwice) {
+    rig.select(kStateSelectFixture, 1);
+    drawTool_Click(kToolLightStrings, context());
+    EXPECT_EQ(rig.editor.ZephSelection.Object, 0);
+    rig.editor.ZephAppendTarget = 2;
+    drawTool_Click(kToolLightStrings, context());
+    EXPECT_EQ(rig.editor.ZephAppendTarget, 2);
+    drawTool_Click(kToolBulbs, context());
+    rig.editor.ZephAppendTarget = 2;
+    drawTool_Click(kToolBulbs, context());
+    EXPECT_EQ(rig.editor.ZephAppendTarget, 0);
+}
+
+TEST_F(Modes, AWizardIsRefusedWhereItsPropWouldNotFit) {
+    rig.simulation->PropCount = kMaxProps;
+    drawTool_Click(kToolTreeWizard, context());
+    ASSERT_EQ(host.boxes.size(), 1U);
+    EXPECT_EQ(host.boxes[0].title, "Qen Visualizer-Error");
+    EXPECT_EQ(host.boxes[0].text, "You have created the maximum number (512) of props.");
+    EXPECT_EQ(rig.editor.ZephUIState, kStateSelectFixture);
+    drawTool_Click(kToolKesh, context());
+    EXPECT_EQ(rig.editor.ZephUIState, kStateDrawing);
+    rig.simulation->FixtureCount = kMaxFixtures;
+    drawTool_Click(kToolMatrixWizard, context());
+    EXPECT_EQ(host.boxes.back().text, "You have created the maximum number (1024) of fixtures.");
+}
+
+TEST_F(Modes, NothingActsWithoutADocumentOrInASimulation) {
+    const auto tryAll = [&] {
+        const ZephEditorState before = rig.editor;
+        mnuSelect_Click(context());
+        mnuItemTool_Click(context());
+        drawTool_Click(kToolFloods, context());
+        chkCmdFixtureOrProp_MouseUp(kToggleProps, true, context());
+        flgObjectSelect_Click(1, context());
+        EXPECT_EQ(rig.editor, before);
+    };
+    rig.editor.ZephUIState = kStateSimulation;
+    tryAll();
+    rig.editor.ZephUIState = kStateSelectFixture;
+    rig.simulation->SimulationOpen = false;
+    tryAll();
+}
+
+TEST_F(Modes, TheListSelectsLockedObjectsAndEndsDrawing) {
+    rig.simulation->Fixtures[2].Locked = true;
+    rig.editor.ZephUIState = kStateDrawing;
+    flgObjectSelect_Click(2, context());
+    expect(kStateSelectFixture, 3, "Fixture Selected:arm - Layer:16");
+    EXPECT_EQ(face.highlighted, 2);
+    EXPECT_TRUE(rig.editor.ZephIgnoreLocks);
+    rig.beginStroke();
+    flgObjectSelect_Click(1, context());
+    EXPECT_EQ(rig.editor.ZephSelection.Object, 2);
+}
+
+TEST_F(Modes, TheListShowsWhatTheStateSelects) {
+    const auto texts = [&] {
+        std::vector<std::string> shown;
+        for (const ZephListEntry& row : ZephListIndex(*rig.simulation, rig.editor))
+            shown.push_back(row.Text + "|" + std::to_string(row.Object));
+        return shown;
+    };
+    using Texts = std::vector<std::string>;
+    EXPECT_EQ(texts(), (Texts{"arm|2", "Hat|3", "Wreath|1"}));
+    rig.select(kStateSelectProp, 3);
+    EXPECT_EQ(texts(), (Texts{"Snowman|3", "Wreath|1"}));
+    chkSimplePropMode_Click(false, context());
+    EXPECT_EQ(texts(), (Texts{"Snowman\n(arm)|2", "Snowman\n(Hat)|3", "Wreath|1"}));
+    EXPECT_EQ(rig.editor.ZephSelection.Object, 0);
+    rig.simulation->SimulationOpen = false;
+    EXPECT_EQ(texts(), Texts{});
+}

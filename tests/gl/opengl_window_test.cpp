@@ -1,0 +1,124 @@
+// The window of the OpenGL engine, opened for real, drawn on and used.
+#include "engine/dialogs/opengl_window.h"
+#include "engine/opengl_surface.h"
+#include "tests/support/drawing_stage.h"
+#include "tests/support/recording_host.h"
+
+#include <QApplication>
+#include <QLabel>
+#include <QPushButton>
+#include <QScreen>
+#include <QTest>
+#include <QWindow>
+
+#include <gtest/gtest.h>
+
+namespace {
+
+struct OpenGLWindow : testing::Test {
+    GLWindowActions actions() {
+        return {[this] { ++stops; }, [this] { ++plays; }, [this] { ++halts; },
+                [this](std::int32_t width, std::int32_t height, double ratio) {
+                    surface.setViewport(width, height, ratio);
+                }};
+    }
+
+    // A canvas of 300 x 200 with a red square of 20 x 20 in the middle, on blue.
+    void SetUp() override {
+        stage.background = QImage(300, 200, QImage::Format_RGB32);
+        stage.background.fill(QColor(0, 0, 120));
+        ZephFixture& bulb = stage.add(kFixtureBulbs, kChannelNormal, 10, 3);
+        bulb.Channels[1].Color = packColor(255, 0, 0);
+        Stage::addPoint(bulb, kPointBulb, 150, 100);
+        stage.finish();
+        ASSERT_TRUE(ZephCreateRenderWindow(stage.background.size(), failures, window));
+        window.move(100, 80);
+        ASSERT_TRUE(QTest::qWaitForWindowExposed(&window));
+        ASSERT_TRUE(surface.ZephGLStartup(
+            {*stage.document, stage.tables, *stage.states, curve, masks().GLShapes, stage.background, 100, 300, 200},
+            window.target(), failures));
+        window.resizeDrawing();
+    }
+    void TearDown() override {
+        EXPECT_TRUE(failures.reports.empty());
+        surface.release();
+    }
+
+    void drawFrame(std::uint8_t alpha) {
+        Call call;
+        call.channel = ChannelDraw{1, 1, 1, 0, alpha};
+        play({call}, stage.tables, surface);
+    }
+    // What stands on the screen at a place of the drawing.
+    QRgb screenAt(int x, int y) {
+        QTest::qWait(50);
+        const QPoint place = window.findChild<QWidget*>("drawing")->mapToGlobal(QPoint(x, y));
+        return QGuiApplication::primaryScreen()->grabWindow(0, place.x(), place.y(), 1, 1).toImage().pixel(0, 0);
+    }
+    void click(const char* name) { QTest::mouseClick(window.findChild<QPushButton*>(name), Qt::LeftButton); }
+
+    int stops = 0;
+    int plays = 0;
+    int halts = 0;
+    Stage stage;
+    const ZephDimmingCurve curve = ZephCreateDummyDimmingCurve();
+    CollectingFailures failures;
+    OpenGLSurface surface;
+    frmZephOpenGL window{actions()};
+};
+
+}  // namespace
+
+TEST_F(OpenGLWindow, ShowsTheLightsOnTheScreen) {
+    drawFrame(255);
+    EXPECT_EQ(screenAt(150, 100), qRgb(255, 0, 0));
+    EXPECT_EQ(screenAt(141, 91), qRgb(255, 0, 0));
+    EXPECT_EQ(screenAt(138, 100), qRgb(0, 0, 120));
+    drawFrame(0);
+    EXPECT_EQ(screenAt(150, 100), qRgb(0, 0, 120));
+}
+
+TEST_F(OpenGLWindow, GrowsRoundTheDrawing) {
+    EXPECT_EQ(window.findChild<QWidget*>("drawing")->size(), QSize(300, 200));
+    window.resize(window.width() + 80, window.height() + 40);
+    QTest::qWait(50);
+    drawFrame(255);  // the driver learns of the new size by this one
+    drawFrame(255);
+    EXPECT_EQ(screenAt(150, 100), qRgb(255, 0, 0));
+    EXPECT_EQ(screenAt(5, 5), qRgb(0, 0, 120));
+    EXPECT_EQ(screenAt(350, 220), qRgb(0, 0, 0));
+}
+
+TEST_F(OpenGLWindow, TellsTheSequencingProgram) {
+    EXPECT_EQ(window.findChild<QLabel*>("StatusBar1Panel3")->text(), "FPS:");
+    click("cmdSEPlay");
+    click("cmdSEPlay");
+    click("cmdSEStop");
+    EXPECT_EQ(plays, 2);
+    EXPECT_EQ(halts, 1);
+    EXPECT_EQ(stops, 0);
+    EXPECT_TRUE(window.isVisible());
+}
+
+TEST_F(OpenGLWindow, AsksToStopByButtonKeyAndClosing) {
+    QTest::mouseClick(window.findChild<QPushButton*>("cmdStop"), Qt::RightButton);
+    EXPECT_EQ(stops, 0);
+    click("cmdStop");
+    EXPECT_EQ(stops, 1);
+    EXPECT_FALSE(window.isVisible());
+    drawFrame(255);  // a frame before the next tick has nowhere to go, and does no harm
+    EXPECT_EQ(window.notedPlace(), QPoint(100, 80));
+
+    window.show();
+    QTest::keyClick(&window, Qt::Key_A);
+    EXPECT_TRUE(window.isVisible());
+    QTest::keyClick(window.windowHandle(), Qt::Key_Escape);
+    EXPECT_EQ(stops, 2);
+    EXPECT_FALSE(window.isVisible());
+
+    window.show();
+    window.move(0, 0);
+    window.close();
+    EXPECT_EQ(stops, 3);
+    EXPECT_EQ(window.notedPlace(), std::nullopt);
+}
