@@ -107,6 +107,9 @@ TEST(Writing, WhatIsWrittenIsReadBackWhole) {
         }
         bench.simulation->Fixtures[1].Comment = "\xC3\xA4 & \xF0\x9F\x8E\x84\r\n\"<\x01'\xEF\xBF\xBF\xEF\xBC\x81\t\x1F";
         EXPECT_TRUE(ZephSaveVisualizerXML("today", bench.context, *bench.simulation));
+        std::string whole = editorText(*bench.simulation, bench.paths, "today");
+        AddHash(false, whole);
+        EXPECT_TRUE(fileText(bench.path()) == whole) << "a save is made in pieces, and they must fit";
         const auto written = std::make_unique<ZephSimulation>(*bench.simulation);
         written->zephSaveFileVersion = "3.0.0";
         // No document can hold U+0001, U+001F and U+FFFF.
