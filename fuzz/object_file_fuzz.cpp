@@ -24,12 +24,19 @@ struct Reader {
     bool channelsSeen = false;
 
     bool read(std::string_view text, TextReading reading, bool prop) {
-        ZephGlobalReset(false, *simulation, watcher);
+        empty();
         simulation->FixtureLedDefault = false;
         host.boxes.clear();
         failures.reports.clear();
         return prop ? loadPropFileText(text, reading, context, *simulation, channelsSeen)
                     : loadFixtureFileText(text, reading, context, *simulation, channelsSeen);
+    }
+    // Only what a load can have filled: to look at all of a document would take most of the time.
+    void empty() {
+        for (; simulation->FixtureCount > 0; --simulation->FixtureCount)
+            simulation->Fixtures[simulation->FixtureCount] = ZephFixture{};
+        for (; simulation->PropCount > 0; --simulation->PropCount)
+            simulation->Props[simulation->PropCount] = ZephProp{};
     }
     std::string outcome() const {
         std::string lines = editorText(*simulation, paths, "");
