@@ -72,6 +72,8 @@ void keepResult(const T& value) {
 
 // One a bench file, called by main in this order.
 void benchLoad(BenchReport& report);
+void benchUndo(BenchReport& report);
+void benchObjectFiles(BenchReport& report);
 void benchParser(BenchReport& report);
 void benchCommands(BenchReport& report);
 void benchCompile(BenchReport& report);

@@ -38,6 +38,8 @@ int main(int count, char** arguments) {
     }
     BenchReport report;
     benchLoad(report);
+    benchUndo(report);
+    benchObjectFiles(report);
     benchParser(report);
     benchCommands(report);
     benchCompile(report);

@@ -3,12 +3,8 @@
 #pragma once
 
 #include "model/simulation.h"
+#include "model/ui_state.h"
 
-// ZephUIState.
-inline constexpr int kStateSimulation = 1;
-inline constexpr int kStateSelectProp = 2;
-inline constexpr int kStateSelectFixture = 3;
-inline constexpr int kStateDrawing = 4;
 // The mode that is asked for to get into kStateDrawing; the other modes are asked for by the number of their state.
 inline constexpr int kModeDrawing = 5;
 

@@ -6,7 +6,7 @@
 #include <QStringConverter>
 
 #include <bit>
-#include <vector>
+#include <utility>
 
 namespace {
 
@@ -37,7 +37,10 @@ public:
             text.remove_prefix(block.size());
         }
     }
-    std::string value() const { return hash_.HashValue(); }
+    std::string value(bool keepMismatch) {
+        add(keepMismatch ? " " : std::to_string(kChecksumSeed));
+        return hash_.HashValue();
+    }
 
 private:
     MD5Hash hash_;
@@ -100,6 +103,48 @@ std::string editorChecksum(std::string_view text, TextRange leftOut, bool keepMi
     TextHash hash;
     hash.add(text.substr(0, leftOut.begin));
     hash.add(text.substr(leftOut.end));
-    hash.add(keepMismatch ? " " : std::to_string(kChecksumSeed));
-    return hash.value();
+    return hash.value(keepMismatch);
+}
+
+// Without a free thread the library computes it in value().
+RunningChecksum::RunningChecksum() : computed_(std::async([this] { return compute(); })) {}
+
+RunningChecksum::~RunningChecksum() {
+    close(false);
+    if (computed_.valid()) computed_.wait();
+}
+
+void RunningChecksum::add(std::string_view piece) {
+    {
+        const std::lock_guard lock(mutex_);
+        waiting_.push_back(piece);
+    }
+    changed_.notify_one();
+}
+
+void RunningChecksum::close(bool keepMismatch) {
+    {
+        const std::lock_guard lock(mutex_);
+        closed_ = true;
+        keepMismatch_ = keepMismatch;
+    }
+    changed_.notify_one();
+}
+
+std::string RunningChecksum::value(bool keepMismatch) {
+    close(keepMismatch);
+    return computed_.get();
+}
+
+std::string RunningChecksum::compute() {
+    TextHash hash;
+    for (;;) {
+        std::unique_lock lock(mutex_);
+        changed_.wait(lock, [&] { return closed_ || !waiting_.empty(); });
+        const std::vector<std::string_view> pieces = std::exchange(waiting_, {});
+        if (pieces.empty()) return hash.value(keepMismatch_);
+        lock.unlock();
+        for (const std::string_view piece : pieces)
+            hash.add(piece);
+    }
 }

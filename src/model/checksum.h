@@ -4,10 +4,14 @@
 
 #include <QCryptographicHash>
 
+#include <condition_variable>
 #include <cstdint>
+#include <future>
+#include <mutex>
 #include <optional>
 #include <string>
 #include <string_view>
+#include <vector>
 
 // MD5 (RFC 1321). Values are upper-case hexadecimal, 32 characters.
 class MD5Hash {
@@ -40,3 +44,26 @@ std::optional<TextRange> findChecksumAttribute(std::string_view text, std::size_
 // The checksum of a document's UTF-8 text with a part left out. What is hashed is the text as UTF-16 code units, low
 // byte first, then the decimal seed; or one blank instead of the seed for a document whose mismatch is to stay marked.
 std::string editorChecksum(std::string_view text, TextRange leftOut, bool keepMismatch);
+
+// The same checksum of a text that is still being made, computed on a second thread piece by piece.
+class RunningChecksum {
+public:
+    RunningChecksum();
+    ~RunningChecksum();
+
+    // The piece must stay where it is until value() has returned. It may end inside a character.
+    void add(std::string_view piece);
+    // Once, behind the last piece. Throws what the hash threw.
+    std::string value(bool keepMismatch);
+
+private:
+    std::string compute();
+    void close(bool keepMismatch);
+
+    std::mutex mutex_;
+    std::condition_variable changed_;
+    std::vector<std::string_view> waiting_;
+    bool closed_ = false;
+    bool keepMismatch_ = false;
+    std::future<std::string> computed_;
+};

@@ -167,6 +167,13 @@ bool ZephDeleteFixturesByProp(int fixture, ZephSimulation& simulation, DocumentW
     return true;
 }
 
+void nameAssignedProps(ZephSimulation& simulation) {
+    for (int f = 1; f <= fixtureBound(simulation); ++f) {
+        ZephFixture& fixture = simulation.Fixtures[f];
+        if (fixture.AssignedItem != 0) fixture.AssignedItemName = propOrEmpty(simulation, fixture.AssignedItem).Name;
+    }
+}
+
 std::string ZephReturnNewFixtureName(const ZephSimulation& simulation) {
     for (int n = 1;; ++n) {
         std::string name = "New Fixture " + std::to_string(n);

@@ -50,6 +50,9 @@ bool ZephDeleteFixturesByProp(int fixture, ZephSimulation& simulation, DocumentW
 void ZephRetreatFixturePointers(int deletedProp, ZephSimulation& simulation);
 void ZephRetreatPropPointers(int deletedFixture, ZephSimulation& simulation);
 
+// Gives every fixture that names a prop the prop's name: what a file does not hold and every load fills in.
+void nameAssignedProps(ZephSimulation& simulation);
+
 // The first of "New Fixture 1", "New Fixture 2", ... that no fixture has.
 std::string ZephReturnNewFixtureName(const ZephSimulation& simulation);
 

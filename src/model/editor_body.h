@@ -7,8 +7,8 @@
 namespace editor_body_detail {
 
 struct BodyRules {
-    const char* procedure;
-    bool version3;  // ribbon export data, DMX pixels and the full record of a prop; not yet in version 2
+    const char* procedure;  // under which an ID that is none is reported
+    bool version3;          // ribbon export data, DMX pixels and the full record of a prop; not yet in version 2
 };
 
 // What a body is read with; the same for all its elements.
@@ -29,6 +29,12 @@ int takeSlot(const Node& node, int max, const BodyContext& context) try {
 }
 
 template <typename Node>
+bool loadProp(const Node& item, const BodyContext& context, ZephProp& prop) {
+    return context.rules.version3 ? LoadProp300(item, context.failures, prop)
+                                  : LoadProp200(item, context.failures, prop);
+}
+
+template <typename Node>
 bool loadItems(const Node& items, const BodyContext& context, ZephSimulation& simulation) {
     bool result = true;
     for (Node item = items.firstElement(); item; item = item.nextElement()) {
@@ -39,18 +45,16 @@ bool loadItems(const Node& items, const BodyContext& context, ZephSimulation& si
             continue;
         }
         simulation.PropCount = slot;
-        ZephProp& prop = simulation.Props[slot];
-        const bool read = context.rules.version3 ? LoadProp300(item, context.failures, prop)
-                                                 : LoadProp200(item, context.failures, prop);
+        const bool read = loadProp(item, context, simulation.Props[slot]);
         result = result && read;
     }
     return result;
 }
 
 template <typename Node>
-bool loadFixturePart(const Node& part, const BodyContext& context, bool ledDefault, ZephFixture& fixture) {
+bool loadFixturePart(const Node& part, const BodyContext& context, bool ledDefault, ZephFixture& fixture,
+                     bool& channelsSeen) {
     const std::string_view name = part.name();
-    bool channelsSeen = false;  // asked for only when single fixtures are loaded
     if (name == "DrawPoints") return LoadPoints(part, context.failures, fixture);
     if (name == "AssignedChannels") return LoadChannels(part, ledDefault, context.failures, fixture, channelsSeen);
     if (name == "Sample") return LoadSampleColors(part, context.failures, fixture);
@@ -59,6 +63,18 @@ bool loadFixturePart(const Node& part, const BodyContext& context, bool ledDefau
     if (name == "DMX") return LoadDMXData(part, context.failures, fixture);
     if (name == "Novaline_Data") return LoadQvFixtureData(part, context.failures, fixture);
     return true;
+}
+
+// A DrawObject with all its parts. ledDefault and channelsSeen: as their readers say.
+template <typename Node>
+bool loadDrawObject(const Node& object, const BodyContext& context, ZephFixture& fixture, bool& ledDefault,
+                    bool& channelsSeen) {
+    bool read = context.rules.version3
+                    ? LoadFixtureParms(object, context.settings, context.failures, fixture)
+                    : LoadFixtureParms200(object, context.settings, context.failures, fixture, ledDefault);
+    for (Node part = object.firstElement(); part; part = part.nextElement())
+        read = loadFixturePart(part, context, ledDefault, fixture, channelsSeen) && read;
+    return read;
 }
 
 template <typename Node>
@@ -72,14 +88,9 @@ bool loadDrawObjects(const Node& objects, const BodyContext& context, ZephSimula
             continue;
         }
         simulation.FixtureCount = slot;
-        ZephFixture& fixture = simulation.Fixtures[slot];
-        bool& ledDefault = simulation.FixtureLedDefault;
-        bool read = context.rules.version3
-                        ? LoadFixtureParms(object, context.settings, context.failures, fixture)
-                        : LoadFixtureParms200(object, context.settings, context.failures, fixture, ledDefault);
-        for (Node part = object.firstElement(); part; part = part.nextElement()) {
-            read = loadFixturePart(part, context, ledDefault, fixture) && read;
-        }
+        bool channelsSeen = false;  // asked for only when single objects are loaded
+        const bool read =
+            loadDrawObject(object, context, simulation.Fixtures[slot], simulation.FixtureLedDefault, channelsSeen);
         result = result && read;
     }
     return result;
@@ -102,10 +113,7 @@ bool loadBody(const Node& root, const BodyContext& context, ZephSimulation& simu
             result = false;
         }
     }
-    for (int f = 1; f <= simulation.FixtureCount; ++f) {
-        ZephFixture& fixture = simulation.Fixtures[f];
-        if (fixture.AssignedItem != 0) fixture.AssignedItemName = propOrEmpty(simulation, fixture.AssignedItem).Name;
-    }
+    nameAssignedProps(simulation);
     return result;
 }
 

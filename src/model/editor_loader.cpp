@@ -1,11 +1,11 @@
 #include "model/editor_loader.h"
 
 #include "model/checksum.h"
+#include "model/document_source.h"
 #include "model/editor_body.h"
-#include "model/source_text.h"
-#include "model/xml_scanner.h"
+#include "model/editor_elements.h"
+#include "model/file_versions.h"
 
-#include <array>
 #include <future>
 
 namespace {
@@ -23,18 +23,9 @@ constexpr LoadMessage kInvalidRoot{"-Not a valid file", "Error:  This file  '",
                                    "' is not a valid editor file for this application.\r\n(003-Invalid Root)"};
 constexpr LoadMessage kFileNotFound{"-Editor Load Error", "Error:  The editor file '",
                                     "' is missing.\r\n(005-File Not Found)"};
-constexpr std::string_view kIncompatibleVersion =
-    "Error:  The File Version is incompatible for this application.\r\nPlease contact support for an upgrade.";
 constexpr std::string_view kBodyErrors = "There were one or more errors encountered loading your simulation.";
 
 constexpr std::string_view kRootName = "Zeph";
-
-struct VersionRow {
-    std::string_view version;
-    bool version3;  // by LoadVisualizerBody300; the older ones by LoadVisualizerBody200, and they count as upgraded
-};
-constexpr std::array kVersions{VersionRow{"1.5.2", false}, VersionRow{"2.0.0", false}, VersionRow{"2.0.1", false},
-                               VersionRow{"2.1.0", false}, VersionRow{"3.0.0", true}};
 
 // How one load speaks to the user.
 struct Speaker {
@@ -48,7 +39,7 @@ struct Speaker {
         host.messageBox(boxTitle(message.suffix), text, BoxIcon::Critical);
     }
     void say(std::string_view text) const {
-        if (showErrors) host.messageBox(boxTitle("-Not a valid file"), text, BoxIcon::Critical);
+        if (showErrors) host.messageBox(boxTitle(kIncompatibleVersionTitle), text, BoxIcon::Critical);
     }
 };
 
@@ -83,9 +74,8 @@ template <typename Node>
 BodyResult readThroughGate(const Node& root, const EditorFileContext& context, ZephSimulation& simulation) {
     const std::string version = root.text("zephSaveFileVersion").value_or("");
     simulation.zephSaveFileVersion = version;
-    const auto row = std::find_if(kVersions.begin(), kVersions.end(),
-                                  [&](const VersionRow& known) { return known.version == version; });
-    if (row == kVersions.end()) return BodyResult::UnknownVersion;
+    const FileVersionRow* row = findFileVersion(version);
+    if (!row) return BodyResult::UnknownVersion;
     simulation.FileUpgraded = !row->version3;
     const auto& [settings, paths, host, failures, watcher] = context;
     const bool read = row->version3 ? LoadVisualizerBody300(root, settings, paths, failures, simulation)
@@ -121,43 +111,21 @@ bool readDocument(const Node& root, std::string_view text, std::size_t rootName,
     return told(body, load.speaker);
 }
 
-bool readGenerally(const SourceText& text, PendingChecksum& checksum, const LoadFrame& load,
-                   ZephSimulation& simulation) {
-    pugi::xml_document document;
-    const std::string_view utf8 = text.view();
-    const pugi::xml_parse_result parsed =
-        document.load_buffer(utf8.data(), utf8.size(), pugi::parse_default, pugi::encoding_utf8);
-    if (parsed.status == pugi::status_out_of_memory) throw std::bad_alloc();
-    const pugi::xml_node root = document.document_element();
-    if (!parsed || !root) {
-        load.speaker.say(kInvalidXml);
-        return false;
-    }
-    const auto rootName = static_cast<std::size_t>(root.offset_debug());
-    return readDocument(XmlNode(root), utf8, rootName, checksum, load, simulation);
-}
-
 bool loadSource(SourceText text, TextReading reading, const LoadFrame& load, ZephSimulation& simulation) {
     PendingChecksum checksum;  // stands behind the text, which it reads until it is gone
-    if (reading != TextReading::GeneralOnly) {
-        XmlScanner scanner(text.view());
-        const ScannedNode root = scanner.root();
-        const std::size_t rootName = scanner.rootNameOffset();
-        if (root) {
+    bool read = false;
+    const RootReading root = readRoot(
+        text, reading,
+        [&](const ScannedNode& found, std::size_t rootName) {
             // Before the first look at the whole text, for nothing takes longer than the checksum.
-            if (const auto stored = root.text("Chksum")) checksum.start(text.view(), rootName, *stored);
-        }
-        if (root && XmlScanner::isUsual(text.view())) {
-            return readDocument(root, text.view(), rootName, checksum, load, simulation);
-        }
-        if (reading == TextReading::QuickOnly) return false;
-    }
-    // A text that is being hashed is UTF-8 already, and must stay where it is.
-    if (!checksum.started() && !decodeSource(text)) {
-        load.speaker.say(kInvalidXml);
-        return false;
-    }
-    return readGenerally(text, checksum, load, simulation);
+            if (const auto stored = found.text("Chksum")) checksum.start(text.view(), rootName, *stored);
+            return checksum.started();
+        },
+        [&](const auto& found, std::size_t rootName) {
+            read = readDocument(found, text.view(), rootName, checksum, load, simulation);
+        });
+    if (root == RootReading::Malformed) load.speaker.say(kInvalidXml);
+    return root == RootReading::Used && read;
 }
 
 // What every entry does around the load itself: the flags of the last load go, and an exception out of the parse has
@@ -196,14 +164,11 @@ bool ZephLoadVisualizerXML(bool showErrors, const EditorFileContext& context, Ze
     });
 }
 
-bool ZephLoadVisualizerXML(const pugi::xml_document& stored, bool showErrors, const EditorFileContext& context,
+bool ZephLoadVisualizerXML(const DocumentSnapshot& stored, bool showErrors, const EditorFileContext& context,
                            ZephSimulation& simulation) {
-    return guardedLoad(showErrors, context, simulation, [&](const LoadFrame& frame) {
-        const XmlNode root(stored.document_element());
-        if (!root || root.name() != kRootName) {
-            frame.speaker.say(root ? kInvalidRoot : kInvalidXml);
-            return false;
-        }
-        return told(readThroughGate(root, context, simulation), frame.speaker);
+    return guardedLoad(showErrors, context, simulation, [&](const LoadFrame&) {
+        restoreSnapshot(stored, context.paths, simulation);
+        simulation.zephSaveFileVersion = kFileVersion;
+        return true;
     });
 }

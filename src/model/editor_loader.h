@@ -2,13 +2,11 @@
 #pragma once
 
 #include "model/document.h"
+#include "model/document_snapshot.h"
+#include "model/document_source.h"
 #include "util/failure.h"
 #include "util/host.h"
 #include "util/paths.h"
-
-namespace pugi {
-class xml_document;
-}
 
 // What loading and saving use besides the document itself.
 struct EditorFileContext {
@@ -24,14 +22,10 @@ struct EditorFileContext {
 // could be read. showErrors false keeps every message box back; the failures of single records are reported always.
 [[nodiscard]] bool ZephLoadVisualizerXML(bool showErrors, const EditorFileContext& context, ZephSimulation& simulation);
 
-// Loads a document that undo or redo kept. Such a document carries no checksum, and the caller has emptied the
-// records before.
-[[nodiscard]] bool ZephLoadVisualizerXML(const pugi::xml_document& stored, bool showErrors,
+// Loads a document that undo or redo kept. Such a document is of the present version and carries no checksum, and the
+// caller has emptied the records before.
+[[nodiscard]] bool ZephLoadVisualizerXML(const DocumentSnapshot& stored, bool showErrors,
                                          const EditorFileContext& context, ZephSimulation& simulation);
-
-// How a text is read. The quick form gives up on unusual spellings and reads nothing then; the general form reads
-// them all. Where the quick form does read, both give the same records, messages and reports.
-enum class TextReading { QuickThenGeneral, GeneralOnly, QuickOnly };
 
 // As the file of that text, already in memory. The name stands in the messages. QuickOnly gives false, silently and
 // without touching a record, where the quick form gives up.

@@ -3,11 +3,44 @@
 #include <array>
 #include <cassert>
 #include <charconv>
+#include <utility>
 
 namespace {
 
+enum : std::uint8_t { kPlain = 0, kSpelledOut = 1, kPerhapsForbidden = 2 };
+
+// What to look closer at. U+FFFE and U+FFFF begin with the byte EF, as many allowed characters do.
+constexpr std::array<std::uint8_t, 256> kClasses = [] {
+    std::array<std::uint8_t, 256> classes{};
+    for (std::size_t code = 0; code < 0x20; ++code)
+        classes[code] = kPerhapsForbidden;
+    classes[0xEF] = kPerhapsForbidden;
+    for (const char letter : {'&', '<', '>', '"', '\r', '\n', '\t'})
+        classes[static_cast<unsigned char>(letter)] = kSpelledOut;
+    return classes;
+}();
+
+std::uint8_t classOf(char letter) noexcept {
+    return kClasses[static_cast<unsigned char>(letter)];
+}
+
+// The first character of the classes, or the text's size.
+std::size_t findClasses(std::string_view text, unsigned classes) noexcept {
+    std::size_t at = 0;
+    while (at < text.size() && (classOf(text[at]) & classes) == 0)
+        ++at;
+    return at;
+}
+
+// How many bytes a forbidden character at the beginning of the text takes; 0 for an allowed one.
+std::size_t forbiddenBytes(std::string_view text) noexcept {
+    if (classOf(text.front()) != kPerhapsForbidden) return 0;
+    if (static_cast<unsigned char>(text.front()) < 0x20) return 1;
+    return text.starts_with("\xEF\xBF\xBE") || text.starts_with("\xEF\xBF\xBF") ? 3 : 0;
+}
+
 // What a character becomes inside double quotes. Line breaks and tabs must be spelled out, or a reader takes them for
-// blanks; "" leaves the character as it is.
+// blanks.
 std::string_view spelling(char letter) noexcept {
     switch (letter) {
     case '&':
@@ -22,16 +55,35 @@ std::string_view spelling(char letter) noexcept {
         return "&#13;";
     case '\n':
         return "&#10;";
-    case '\t':
-        return "&#9;";
     default:
-        return "";
+        return "&#9;";
     }
 }
 
-constexpr std::string_view kSpelledOut("&<>\"\r\n\t\0", 8);
-
 }  // namespace
+
+bool holdsForbidden(std::string_view text) noexcept {
+    for (;;) {
+        text.remove_prefix(findClasses(text, kPerhapsForbidden));
+        if (text.empty()) return false;
+        if (forbiddenBytes(text) != 0) return true;
+        text.remove_prefix(1);
+    }
+}
+
+std::string withoutForbidden(std::string_view text) {
+    std::string allowed;
+    while (!text.empty()) {
+        const std::size_t forbidden = forbiddenBytes(text);
+        if (forbidden == 0) allowed.push_back(text.front());
+        text.remove_prefix(std::max<std::size_t>(forbidden, 1));
+    }
+    return allowed;
+}
+
+std::string XmlText::take() {
+    return std::exchange(text_, {});
+}
 
 void XmlText::openStart(std::string_view name) {
     text_.push_back('<');
@@ -62,13 +114,18 @@ void XmlText::attribute(std::string_view name, bool value) {
 
 void XmlText::attribute(std::string_view name, std::string_view value) {
     beginAttribute(name);
-    while (!value.empty()) {
-        const std::size_t plain = std::min(value.find_first_of(kSpelledOut), value.size());
+    for (;;) {
+        const std::size_t plain = findClasses(value, kSpelledOut | kPerhapsForbidden);
         text_.append(value.substr(0, plain));
         value.remove_prefix(plain);
         if (value.empty()) break;
-        text_.append(spelling(value.front()));
-        value.remove_prefix(1);
+        const std::size_t forbidden = forbiddenBytes(value);
+        if (classOf(value.front()) == kSpelledOut) {
+            text_.append(spelling(value.front()));
+        } else if (forbidden == 0) {
+            text_.push_back(value.front());
+        }
+        value.remove_prefix(std::max<std::size_t>(forbidden, 1));
     }
     text_.push_back('"');
 }

@@ -6,6 +6,12 @@
 #include <string>
 #include <string_view>
 
+// Whether a UTF-8 text has characters that no XML document can hold: those below the blank other than tab and line
+// breaks, U+FFFE and U+FFFF (XML 1.0, production 2).
+bool holdsForbidden(std::string_view text) noexcept;
+// The text as a document holds it: without them. Bytes that are no UTF-8 stay.
+std::string withoutForbidden(std::string_view text);
+
 class XmlText {
 public:
     explicit XmlText(std::size_t expectedBytes) { text_.reserve(expectedBytes); }
@@ -13,9 +19,8 @@ public:
     // "<name"; attributes follow, then closeStart or closeEmpty.
     void openStart(std::string_view name);
     void attribute(std::string_view name, std::int32_t value);
-    void attribute(std::string_view name, bool value);  // True, False
-    void attribute(std::string_view name,
-                   std::string_view value);  // UTF-8; a zero byte, which XML cannot hold, is left out
+    void attribute(std::string_view name, bool value);              // True, False
+    void attribute(std::string_view name, std::string_view value);  // UTF-8; see withoutForbidden
     void attribute(std::string_view name, const char* value) { attribute(name, std::string_view(value)); }
     void closeStart() { text_.push_back('>'); }  // children follow
     void closeEmpty() { text_.append("/>"); }    // no children
@@ -25,7 +30,7 @@ public:
     void raw(std::string_view text) { text_.append(text); }
 
     std::size_t size() const { return text_.size(); }
-    std::string take() { return std::move(text_); }
+    std::string take();  // leaves nothing behind
 
 private:
     void beginAttribute(std::string_view name);

@@ -113,7 +113,7 @@ void installFaultLog(const std::string& logFile) {
     zoneSeconds = local.tm_gmtoff;
     struct sigaction action {};
     action.sa_sigaction = writeFault;
-    action.sa_flags = SA_SIGINFO | SA_RESETHAND;
+    action.sa_flags = static_cast<int>(SA_SIGINFO | SA_RESETHAND);
     for (const int signal : kSignals)
         sigaction(signal, &action, nullptr);
 }

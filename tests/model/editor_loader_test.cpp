@@ -195,8 +195,7 @@ TEST(Loading, WideEncodingsReadLikeUtf8) {
 TEST(Loading, AStoredDocumentIsReadIntoTheRecordsAsTheyStand) {
     LoadBench bench;
     buildTypicalDocument(*bench.simulation);
-    pugi::xml_document stored;
-    ASSERT_TRUE(stored.load_string(editorText(*bench.simulation, bench.paths, "now").c_str()));
+    const DocumentSnapshot stored = takeSnapshot(*bench.simulation, bench.paths, {});
     const auto before = std::make_unique<ZephSimulation>(*bench.simulation);
     before->zephSaveFileVersion = "3.0.0";
     ZephGlobalReset(true, *bench.simulation, bench.watcher);
@@ -204,6 +203,6 @@ TEST(Loading, AStoredDocumentIsReadIntoTheRecordsAsTheyStand) {
     EXPECT_TRUE(ZephLoadVisualizerXML(stored, true, bench.context, *bench.simulation));
     EXPECT_TRUE(*bench.simulation == *before);
     EXPECT_EQ(bench.watcher.clipboards, 0) << "emptying the records was the caller's, and so is the clipboard";
-    EXPECT_FALSE(ZephLoadVisualizerXML(pugi::xml_document(), true, bench.context, *bench.simulation));
-    EXPECT_EQ(bench.host.boxes.at(0).title, "Qen Visualizer-Invalid Editor File");
+    EXPECT_FALSE(ZephLoadVisualizerXML(DocumentSnapshot(), true, bench.context, *bench.simulation));
+    EXPECT_EQ(bench.host.boxes.at(0).title, "Qen Visualizer-Editor Load Error");
 }

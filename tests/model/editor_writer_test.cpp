@@ -105,10 +105,15 @@ TEST(Writing, WhatIsWrittenIsReadBackWhole) {
         } else {
             buildTypicalDocument(*bench.simulation);
         }
-        bench.simulation->Fixtures[1].Comment = "\xC3\xA4 & \xF0\x9F\x8E\x84\r\n\"<\x01'";
+        bench.simulation->Fixtures[1].Comment = "\xC3\xA4 & \xF0\x9F\x8E\x84\r\n\"<\x01'\xEF\xBF\xBF\xEF\xBC\x81\t\x1F";
         EXPECT_TRUE(ZephSaveVisualizerXML("today", bench.context, *bench.simulation));
+        std::string whole = editorText(*bench.simulation, bench.paths, "today");
+        AddHash(false, whole);
+        EXPECT_TRUE(fileText(bench.path()) == whole) << "a save is made in pieces, and they must fit";
         const auto written = std::make_unique<ZephSimulation>(*bench.simulation);
         written->zephSaveFileVersion = "3.0.0";
+        // No document can hold U+0001, U+001F and U+FFFF.
+        written->Fixtures[1].Comment = "\xC3\xA4 & \xF0\x9F\x8E\x84\r\n\"<'\xEF\xBC\x81\t";
         written->SimulationOpen = false;  // that it is open is for whoever asked for the load to say
         EXPECT_TRUE(ZephLoadVisualizerXML(true, bench.context, *bench.simulation));
         EXPECT_TRUE(*bench.simulation == *written);

@@ -26,6 +26,10 @@ TEST(ToolOptions, TakeEachCommandsSwitches) {
     EXPECT_EQ(send.speed, 2.5);
     EXPECT_EQ(send.port, 1);
     EXPECT_TRUE(parseToolOptions({"send", "--help"}).options.help);
+    const ToolOptions convert = parseToolOptions({"convert", "a.zee", "--force", "b.zee"}).options;
+    EXPECT_EQ(convert.file, "a.zee");
+    EXPECT_EQ(convert.secondFile, "b.zee");
+    EXPECT_TRUE(convert.force);
 }
 
 TEST(ToolOptions, NameWhatIsWrongWithACall) {
@@ -44,10 +48,13 @@ TEST(ToolOptions, NameWhatIsWrongWithACall) {
     EXPECT_EQ(problem({"render", "a", "--capture", "b", "--out", "c", "--from", "9", "--to", "8"}),
               "--to lies before --from");
     EXPECT_EQ(problem({"record", "--out", "a"}), "");
+    EXPECT_EQ(problem({"record", "--out", "a", "b"}), "'b' is one file too many");
+    EXPECT_EQ(problem({"convert", "a"}), "no file to write is named");
+    EXPECT_EQ(problem({"convert", "a", "b", "c"}), "'c' is one file too many");
 }
 
 TEST(ToolOptions, UsageAndHelpNameEveryCommand) {
-    for (const char* command : {"info", "table", "trace", "render", "send", "record", "demo-show"}) {
+    for (const char* command : {"info", "table", "trace", "render", "send", "record", "demo-show", "convert"}) {
         EXPECT_NE(toolHelp("").find(std::string("zeph-tool ") + command), std::string::npos) << command;
         EXPECT_EQ(toolUsage(command).rfind(std::string("usage: zeph-tool ") + command, 0), 0u) << command;
     }

@@ -186,6 +186,31 @@ TEST_F(Tool, ExitsWithOneForBadInputAndTwoForWrongUsage) {
     EXPECT_EQ(tool({"--help"}).status, 0);
 }
 
+TEST_F(Tool, ConvertWritesThePresentVersionAndSparesWhatIsThere) {
+    write("old.zee", QByteArray(kDisplay).replace("3.0.0", "2.1.0"));
+    const auto read = [&](const char* name) {
+        QFile file(path(name));
+        return file.open(QIODevice::ReadOnly) ? file.readAll() : QByteArray("not there");
+    };
+    EXPECT_EQ(tool({"convert", path("old.zee"), path("new.zee")}).status, 0);
+    const QJsonObject info = tool({"info", path("new.zee"), "--json"}).json();
+    EXPECT_EQ(info["zephSaveFileVersion"].toString(), "3.0.0");
+    EXPECT_EQ(info["Fixtures"][0]["Name"].toString(), "Roof");
+    EXPECT_TRUE(read("new.zee").contains(" Chksum=\""));
+
+    const Outcome refused = tool({"convert", path("old.zee"), path("old.zee")});
+    EXPECT_EQ(refused.status, 1);
+    EXPECT_TRUE(refused.err.endsWith("old.zee exists; --force replaces it\n")) << refused.err.constData();
+    EXPECT_TRUE(read("old.zee").contains("2.1.0"));
+    EXPECT_EQ(tool({"convert", path("old.zee"), path("old.zee"), "--force"}).status, 0);
+    EXPECT_TRUE(read("old.zee").contains("\"3.0.0\""));
+
+    write("bad.zee", QByteArray(kDisplay).replace("BulbSize", "BulbSise"));
+    EXPECT_EQ(tool({"convert", path("bad.zee"), path("half.zee")}).status, 1);
+    EXPECT_EQ(read("half.zee"), "not there");
+    EXPECT_EQ(tool({"convert", path("new.zee"), path("no/folder.zee")}).status, 1);
+}
+
 TEST_F(Tool, DemoShowAddressesTheDisplay) {
     EXPECT_EQ(tool({"demo-show", path("roof.zee"), "--out", path("show.zcap"), "--seconds", "5"}).status, 0);
     const Outcome run = tool({"trace", path("roof.zee"), "--capture", path("show.zcap"), "--until", "5000"});

@@ -1,3 +1,4 @@
+#include "programs/tool/convert_command.h"
 #include "programs/tool/demo_show_command.h"
 #include "programs/tool/info_command.h"
 #include "programs/tool/options.h"
@@ -21,9 +22,9 @@ struct Command {
     int (*run)(const ToolOptions& options);
 };
 
-constexpr Command kCommands[] = {{"info", runInfo},         {"table", runTable}, {"trace", runTrace},
-                                 {"render", runRender},     {"send", runSend},   {"record", runRecord},
-                                 {"demo-show", runDemoShow}};
+constexpr Command kCommands[] = {{"info", runInfo},          {"table", runTable},    {"trace", runTrace},
+                                 {"render", runRender},      {"send", runSend},      {"record", runRecord},
+                                 {"demo-show", runDemoShow}, {"convert", runConvert}};
 
 int runCommand(const ToolOptions& options) {
     for (const Command& command : kCommands) {

@@ -15,9 +15,10 @@ struct CommandRow {
     std::string_view allowed;  // the switches it takes, each between blanks
     std::string_view needed;
     std::string_view help;
+    std::size_t files = 1;  // how many it is called with
 };
 
-constexpr std::array<CommandRow, 7> kCommands{{
+constexpr std::array<CommandRow, 8> kCommands{{
     {"info", "info FILE.zee [--json]", " --json ", "",
      "Loads the display and tells what is in it. --json prints every record. Exit status 1 where the file could not "
      "be\n"
@@ -44,10 +45,15 @@ constexpr std::array<CommandRow, 7> kCommands{{
     {"record", "record --out CAP.zcap [--port 30303] [--address 127.0.0.1] [--tcp] [--seconds N]",
      " --out --port --address --tcp --seconds ", " --out ",
      "Writes what arrives on the port as a capture, until it is stopped. A recording that is killed stays readable up\n"
-     "to its last whole line."},
+     "to its last whole line.",
+     0},
     {"demo-show", "demo-show FILE.zee --out CAP.zcap [--seconds N]", " --out --seconds ", " --out ",
      "Makes a capture that exercises every channel of the display: chases, fades, twinkle, shimmer, strobes, level\n"
      "dumps, ribbon motions and colour effects."},
+    {"convert", "convert IN.zee OUT.zee [--force]", " --force ", "",
+     "Loads a display of any version and writes it as one of the present version, with its checksum. A file that is\n"
+     "already there is replaced only with --force. Nothing is written of a display that could not be read whole.",
+     2},
 }};
 
 const CommandRow* rowOf(std::string_view command) {
@@ -96,6 +102,7 @@ bool takeFlag(const std::string& name, ToolOptions& options) {
     if (name == "--json") return options.json = true;
     if (name == "--tcp") return options.tcp = true;
     if (name == "--loop") return options.loop = true;
+    if (name == "--force") return options.force = true;
     if (name == "--on-request") return options.onRequest = true;
     return false;
 }
@@ -108,7 +115,8 @@ std::string renderProblem(const ToolOptions& options) {
 }
 
 std::string problemOf(const CommandRow& row, const std::vector<std::string>& given, const ToolOptions& options) {
-    if (options.file.empty() && row.name != "record") return "no file is named";
+    if (row.files > 0 && options.file.empty()) return "no file is named";
+    if (row.files > 1 && options.secondFile.empty()) return "no file to write is named";
     std::string_view needed = row.needed;
     while (needed.size() > 1) {
         const std::size_t end = needed.find(' ', 1);
@@ -137,6 +145,7 @@ ParsedOptions parseToolOptions(const std::vector<std::string>& args) {
     const CommandRow* row = rowOf(options.command);
     if (!row) return wrong(options, "there is no command '" + options.command + "'");
     std::vector<std::string> given;
+    std::size_t files = 0;
     for (std::size_t i = 1; i < args.size(); ++i) {
         const std::string& arg = args[i];
         if (isHelp(arg)) {
@@ -144,9 +153,8 @@ ParsedOptions parseToolOptions(const std::vector<std::string>& args) {
             return {options, ""};
         }
         if (!arg.starts_with("--")) {
-            if (row->name == "record" || !options.file.empty())
-                return wrong(options, "'" + arg + "' is one file too many");
-            options.file = arg;
+            if (files == row->files) return wrong(options, "'" + arg + "' is one file too many");
+            (files++ == 0 ? options.file : options.secondFile) = arg;
             continue;
         }
         if (!holds(row->allowed, arg)) return wrong(options, options.command + " does not take " + arg);

@@ -7,9 +7,10 @@
 #include <vector>
 
 struct ToolOptions {
-    std::string command;  // info, table, trace, render, send, record, demo-show
+    std::string command;  // info, table, trace, render, send, record, demo-show, convert
     bool help = false;
-    std::string file;  // the display, or for send the capture
+    std::string file;        // the display, or for send the capture
+    std::string secondFile;  // convert: the file to write
     std::string capture;
     std::string out;
     std::string engine = "standard";
@@ -27,6 +28,7 @@ struct ToolOptions {
     bool json = false;
     bool tcp = false;
     bool loop = false;
+    bool force = false;
     bool onRequest = false;
 };
 

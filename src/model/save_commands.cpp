@@ -1,0 +1,74 @@
+#include "model/save_commands.h"
+
+#include "model/editor_writer.h"
+#include "util/text.h"
+
+#include <QFile>
+
+#include <optional>
+
+namespace {
+
+constexpr std::string_view kModule = "frmZephMain";
+constexpr int kMaxBackups = 1000;
+
+std::string backupName(const std::string& fullPath, int n) {
+    const std::string digits = "000" + std::to_string(n);
+    return fullPath + ".bak" + digits.substr(digits.size() - 4);
+}
+
+std::optional<std::string> freeBackupName(const std::string& fullPath) {
+    for (int n = 1; n <= kMaxBackups; ++n) {
+        std::string candidate = backupName(fullPath, n);
+        if (!QFile::exists(QString::fromStdString(candidate))) return candidate;
+    }
+    return std::nullopt;
+}
+
+void saveAndTell(const SaveContext& context, ZephSimulation& simulation, AutoSaveState& autosave) {
+    context.face.addRecentFile(simulation.FilePath + simulation.FileName);
+    // A refusal of the disk was told; the commands have always counted the document as saved all the same.
+    ZephSaveVisualizerXML(context.createdAt, context.files, simulation);
+    simulation.SimulationDirty = false;
+    context.files.host.setStatusPanel(1, "");
+    autosave.Tag = 0;
+    simulation.FileUpgraded = false;
+    context.face.documentSaved();
+}
+
+}  // namespace
+
+bool ZephBackUpUpgradedFile(const std::string& fullPath, Host& host) {
+    const std::optional<std::string> name = freeBackupName(fullPath);
+    if (name && QFile::copy(QString::fromStdString(fullPath), QString::fromStdString(*name))) {
+        host.messageBox("File Backup",
+                        "This Zeph file has been updated to the new G4 file format.  Your existing Zeph file has been "
+                        "backed up and is named:\r\n\r\n" +
+                            *name,
+                        BoxIcon::Information);
+        return true;
+    }
+    return host.messageBox("Unable to create backup", "Unable to create backup G3 Zeph file.  Do you want to continue?",
+                           BoxIcon::Question, BoxButtons::YesNo) == BoxAnswer::Yes;
+}
+
+void mnuFileSave_Click(const SaveContext& context, ZephSimulation& simulation, AutoSaveState& autosave) try {
+    if (simulation.FileName.empty()) {
+        mnuFileSaveAs_Click(context, simulation, autosave);
+        simulation.FileUpgraded = false;
+        return;
+    }
+    const bool goesOn = !simulation.FileUpgraded ||
+                        ZephBackUpUpgradedFile(simulation.FilePath + simulation.FileName, context.files.host);
+    if (goesOn) saveAndTell(context, simulation, autosave);
+}
+ZEPH_GUARD(context.files.failures, kModule, )
+
+void mnuFileSaveAs_Click(const SaveContext& context, ZephSimulation& simulation, AutoSaveState& autosave) try {
+    std::string chosen;
+    if (!context.face.chooseOutputFile(chosen)) return;
+    simulation.FilePath = ZephPathFromFullPath(chosen);
+    simulation.FileName = ZephNameFromFullPath(chosen);
+    saveAndTell(context, simulation, autosave);
+}
+ZEPH_GUARD(context.files.failures, kModule, )

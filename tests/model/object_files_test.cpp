@@ -1,0 +1,287 @@
+#include "model/editor_writer.h"
+#include "model/object_files.h"
+#include "tests/support/limit_document.h"
+#include "tests/support/loading.h"
+#include "util/whole_file.h"
+
+#include <QFile>
+
+#include <gtest/gtest.h>
+
+namespace {
+
+struct ObjectBench : LoadBench {
+    bool channelsSeen = false;
+
+    ObjectBench() { ZephGlobalReset(false, *simulation, watcher); }
+    ObjectSaving saving() { return {"today", host, failures}; }
+    bool fixtureText(std::string_view text) {
+        return loadFixtureFileText(text, TextReading::QuickThenGeneral, context, *simulation, channelsSeen);
+    }
+    bool propText(std::string_view text) {
+        return loadPropFileText(text, TextReading::QuickThenGeneral, context, *simulation, channelsSeen);
+    }
+    std::string lastBox() const {
+        return host.boxes.empty() ? "" : host.boxes.back().title + "|" + host.boxes.back().text;
+    }
+};
+
+ZephFixture sampleFixture(std::int32_t type) {
+    ZephFixture fixture;
+    InitializeFixture(ZephSettings(), fixture);
+    fixture.Fixture_Type = type;
+    fixture.Name = "F & G";
+    fixture.ChannelCount = 1;
+    fixture.Channels[1].Name = "c";
+    fixture.PointCount = 2;
+    fixture.DrawPoints[1] = {kPointMove, 15, 30};
+    fixture.DrawPoints[2] = {kPointLine, -15, 45};
+    return fixture;
+}
+
+constexpr std::string_view kDrawObject =
+    "<DrawObject ID=\"9\" Name=\"F\" BulbSize=\"1\" BulbSpacing=\"1\" Comment=\"\" BulbShape=\"1\" ZOrder=\"1\" "
+    "AssignedItem=\"7\" Locked=\"False\">%</DrawObject>";
+
+// count fixtures, each with the parts.
+std::string objects(int count, std::string_view parts = "") {
+    std::string text = "<DrawObjects>";
+    for (int n = 1; n <= count; ++n)
+        text.append(kDrawObject).replace(text.rfind('%'), 1, parts);
+    return text + "</DrawObjects>";
+}
+
+// A prop that lists that many members, with numbers of another display.
+std::string items(int members, int firstId = 1) {
+    std::string text = "<Items><Item ID=\"1\" Name=\"P\" Locked=\"True\" Comment=\"\">";
+    for (int n = firstId; n < firstId + members; ++n)
+        text += "<AssignedObject ID=\"" + std::to_string(n) + "\" Object=\"" + std::to_string(700 + n) + "\"/>";
+    return text + "</Item></Items>";
+}
+
+std::string file(std::string_view root, std::string_view version, const std::string& body) {
+    const std::string name(root);
+    return "<" + name + " zephSaveFileVersion=\"" + std::string(version) + "\">" + body + "</" + name + ">";
+}
+
+}  // namespace
+
+TEST(ObjectFiles, AFixtureFileIsSpelledToTheLetter) {
+    const auto lines = [](std::string text) {
+        for (std::size_t at = text.find('\n'); at != std::string::npos; at = text.find('\n', at + 2))
+            text.insert(at, 1, '\r');
+        return text;
+    };
+    const std::string head =
+        "<?xml version='1.0' encoding='UTF-8'?>\n"
+        "<ZephFixture zephSaveFileVersion=\"3.0.0\" CreatedAt=\"today\">\n"
+        "    <DrawObjects>\n"
+        "        <DrawObject ID=\"1\" Name=\"F &amp; G\" BulbSize=\"2\" BulbSpacing=\"2\" Comment=\"\" BulbShape=\"1\" "
+        "ZOrder=\"1\" AssignedItem=\"0\" Locked=\"False\" Fixture_Type=\"";
+    const std::string sample = "\" Channel_Type=\"1\" Max_Opacity=\"50\">\n"
+                               "            <Sample Background_Color=\"0\" RGB_R=\"0\" RGB_G=\"0\" RGB_B=\"0\"/>\n";
+    const std::string tail = "            <DrawPoints>\n"
+                             "                <DrawPoint ID=\"1\" Type=\"6\" X=\"15\" Y=\"30\"/>\n"
+                             "                <DrawPoint ID=\"2\" Type=\"2\" X=\"-15\" Y=\"45\"/>\n"
+                             "            </DrawPoints>\n"
+                             "        </DrawObject>\n"
+                             "    </DrawObjects>\n"
+                             "</ZephFixture>";
+    const std::string kesh = "            <Kesh Network=\"0\" Base_Unit=\"0\" Unit_Mode=\"0\" Channel_Mode=\"0\" "
+                             "Resolution=\"0\" Physical_Pixel_Number=\"1\"/>\n";
+    EXPECT_EQ(fixtureFileText(sampleFixture(kFixtureStrings), kChannelChoiceNo, "today"),
+              lines(head + "1" + sample + tail));
+    // A ribbon's place on the network is no channel data.
+    EXPECT_EQ(fixtureFileText(sampleFixture(kFixtureKesh), kChannelChoiceNo, "today"),
+              lines(head + "4" + sample + kesh + tail));
+}
+
+TEST(ObjectFiles, AFixtureComesAlongAlone) {
+    for (const std::int32_t type : {kFixtureStrings, kFixtureKesh, kFixtureDmxPixels}) {
+        for (const int choice : {kChannelChoiceYes, kChannelChoiceNo}) {
+            ObjectBench bench;
+            ZephFixture fixture = sampleFixture(type);
+            fixture.AssignedItem = 3;
+            fixture.Kesh.Base_Unit = type == kFixtureKesh ? 5 : 0;
+            fixture.DMX.Universe = type == kFixtureDmxPixels ? 9 : 0;
+            const std::string path = bench.folderPath + "a.zff";
+            ASSERT_TRUE(ZephSaveFixtureXML(fixture, path, choice, bench.saving()));
+            buildTypicalDocument(*bench.simulation);
+            const int count = bench.simulation->FixtureCount;
+            ASSERT_TRUE(ZephLoadFixtureFileXML(path, bench.context, *bench.simulation, bench.channelsSeen));
+            const bool channels = choice == kChannelChoiceYes && type == kFixtureStrings;
+            EXPECT_EQ(bench.channelsSeen, channels);
+            ASSERT_EQ(bench.simulation->FixtureCount, count + 1);
+            fixture.AssignedItem = 0;
+            if (!channels) {
+                fixture.ChannelCount = 0;
+                fixture.Channels[1] = {};
+            }
+            EXPECT_TRUE(bench.simulation->Fixtures[count + 1] == fixture);
+            EXPECT_TRUE(bench.host.boxes.empty());
+        }
+    }
+}
+
+TEST(ObjectFiles, APropTakesItsFixturesAlongInOrder) {
+    ObjectBench bench;
+    buildTypicalDocument(*bench.simulation);
+    ZephSimulation& document = *bench.simulation;
+    const int prop = ++document.PropCount;
+    document.Props[prop].Name = "Carried";
+    document.Props[prop].QvMatrixInd = 2;
+    for (const int fixture : {7, 9, 30})
+        ZephAddFixtureToProp(fixture, prop, document);
+    const std::string path = bench.folderPath + "a.zpf";
+    ASSERT_TRUE(ZephSavePropXML(document, document.Props[prop], path, kChannelChoiceYes, bench.saving()));
+    const int base = document.FixtureCount;
+    ASSERT_TRUE(ZephLoadPropFileXML(path, bench.context, document, bench.channelsSeen));
+    EXPECT_TRUE(bench.channelsSeen);
+    ASSERT_EQ(document.PropCount, prop + 1);
+    ZephProp expected = document.Props[prop];
+    for (int member = 1; member <= 3; ++member) {
+        ZephFixture fixture = document.Fixtures[expected.Object[member]];
+        fixture.AssignedItem = prop + 1;
+        EXPECT_TRUE(document.Fixtures[base + member] == fixture) << member;
+        expected.Object[member] = base + member;
+    }
+    EXPECT_TRUE(document.Props[prop + 1] == expected);
+    EXPECT_EQ(document.FixtureCount, base + 3);
+
+    // A number that is no fixture keeps its place as an empty one.
+    document.Props[prop].Object[2] = 5000;
+    const std::string text = propFileText(document, document.Props[prop], kChannelChoiceNo, "today");
+    ASSERT_TRUE(bench.propText(text));
+    EXPECT_FALSE(bench.channelsSeen);
+    EXPECT_EQ(document.Fixtures[document.FixtureCount].Name, document.Fixtures[30].Name);
+    EXPECT_EQ(document.Fixtures[document.FixtureCount - 1].Name, "");
+}
+
+TEST(ObjectFiles, SayWhatIsWrongWithAFile) {
+    const std::string good = objects(1);
+    struct Row {
+        std::string text;
+        bool prop;
+        const char* box;
+    };
+    for (const Row& row : std::vector<Row>{
+             {"", false, "Corrupted Fixture File|Error:  The fixture file is invalid or corrupted."},
+             {"<ZephFixture", false, "Corrupted Fixture File|Error:  The fixture file is invalid or corrupted."},
+             {"", true, "Corrupted Prop File|Error:  The Prop file is invalid or corrupted."},
+             {file("Zeph", "3.0.0", good), false,
+              "Invalid Fixture File|Error:  This is not a valid fixture file for this application."},
+             {file("ZephFixture", "3.0.0", good), true,
+              "Invalid Prop File|Error:  This is not a valid Prop file for this application."},
+             {file("ZephFixture", "3.0.1", good), false,
+              "-Not a valid file|Error:  The File Version is incompatible for this application.\r\nPlease contact "
+              "support for an upgrade."},
+             {file("ZephFixture", "3.0.0", ""), false, "-Fixture Load|Error:  Could Not load the fixture's body."},
+             {file("ZephFixture", "2.0.0", objects(1, "<Sample/>")), false,
+              "-Fixture Load|Error:  Could Not load the fixture's body."},
+             {file("ZephProp", "2.1.0", good), true, "-Prop Load|Error:  Could Not load the prop's body."}}) {
+        SCOPED_TRACE(row.text);
+        ObjectBench bench;
+        EXPECT_FALSE(row.prop ? bench.propText(row.text) : bench.fixtureText(row.text));
+        ASSERT_EQ(bench.host.boxes.size(), 1u);
+        EXPECT_EQ(bench.lastBox(), std::string("Qen Visualizer") + row.box);
+        EXPECT_EQ(bench.simulation->PropCount, 0);
+        if (row.prop) continue;
+        EXPECT_EQ(bench.simulation->FixtureCount, 0);
+        EXPECT_TRUE(bench.simulation->Fixtures[1] == ZephFixture());
+    }
+    ObjectBench bench;
+    EXPECT_FALSE(
+        ZephLoadFixtureFileXML(bench.folderPath + "none", bench.context, *bench.simulation, bench.channelsSeen));
+    EXPECT_EQ(bench.lastBox(), "Qen VisualizerMissing Fixture File|Error:  The fixture file is missing or invalid.");
+    EXPECT_FALSE(ZephLoadPropFileXML(bench.folderPath, bench.context, *bench.simulation, bench.channelsSeen));
+    EXPECT_EQ(bench.lastBox(), "Qen VisualizerMissing Prop File|Error:  The Prop file is missing or invalid.");
+    EXPECT_FALSE(ZephSaveFixtureXML({}, bench.folderPath + "no/a.zff", kChannelChoiceNo, bench.saving()));
+    EXPECT_EQ(bench.lastBox(), "Qen Visualizer-Save Error|There was a problem saving the fixture data to disk.  Please "
+                               "try again.");
+    EXPECT_FALSE(
+        ZephSavePropXML(*bench.simulation, {}, bench.folderPath + "no/a.zpf", kChannelChoiceNo, bench.saving()));
+    EXPECT_EQ(bench.lastBox(),
+              "Qen Visualizer-Save Error|There was a problem saving the prop data to disk.  Please try "
+              "again.");
+}
+
+TEST(ObjectFiles, KeepWithinTheLimits) {
+    ObjectBench bench;
+    ZephSimulation& document = *bench.simulation;
+    document.FixtureCount = kMaxFixtures;
+    EXPECT_FALSE(bench.fixtureText(file("ZephFixture", "3.0.0", objects(1))));
+    EXPECT_EQ(bench.host.boxes.at(0).title, "Qen Visualizer-Too many fixtures");
+    EXPECT_EQ(bench.host.boxes.at(0).text,
+              "You can not load this fixture since it would exceed the maximum number of fixtures allowed.");
+    EXPECT_EQ(document.FixtureCount, kMaxFixtures);
+
+    // One too many by the prop's own list, then by the fixtures in the file.
+    const std::string listed = file("ZephProp", "2.1.0", items(3) + objects(3));
+    const std::string surplus = file("ZephProp", "2.1.0", items(2) + objects(3));
+    for (const std::string& text : {listed, surplus}) {
+        document.FixtureCount = kMaxFixtures - 2;
+        bench.host.boxes.clear();
+        EXPECT_FALSE(bench.propText(text));
+        EXPECT_EQ(bench.host.boxes.at(0).text,
+                  "You can not load this prop since it would exceed the maximum number of fixtures allowed.");
+        EXPECT_EQ(document.FixtureCount, kMaxFixtures - 2);
+        EXPECT_EQ(document.PropCount, 0);
+        EXPECT_TRUE(document.Fixtures[kMaxFixtures] == ZephFixture());
+        EXPECT_TRUE(document.Props[1] == ZephProp());
+    }
+    document.FixtureCount = kMaxFixtures - 3;
+    EXPECT_TRUE(bench.propText(listed));
+
+    document.FixtureCount = 0;
+    document.PropCount = kMaxProps;
+    bench.host.boxes.clear();
+    EXPECT_FALSE(bench.propText(listed));
+    EXPECT_EQ(bench.host.boxes.at(0).title, "Qen Visualizer-Too many props");
+    EXPECT_EQ(document.FixtureCount, 0);
+}
+
+TEST(ObjectFiles, APropListsWhatCameAlongAndNothingElse) {
+    struct Row {
+        int listed;
+        int fixtures;
+        int members;
+    };
+    for (const Row& row : {Row{1, 3, 1}, Row{3, 1, 1}, Row{0, 2, 0}, Row{64, 64, 64}}) {
+        ObjectBench bench;
+        ZephSimulation& document = *bench.simulation;
+        document.FixtureCount = 10;
+        document.Fixtures[11].Name = "left behind by a damaged file";
+        document.Props[1].QvFF = "likewise";
+        ASSERT_TRUE(bench.propText(file("ZephProp", "2.1.0", items(row.listed) + objects(row.fixtures))));
+        EXPECT_EQ(document.FixtureCount, 10 + row.fixtures);
+        EXPECT_EQ(document.Props[1].AssignedCount, row.members);
+        EXPECT_EQ(document.Props[1].QvFF, "");
+        for (int n = 1; n <= kMaxFixturesInProp; ++n)
+            EXPECT_EQ(document.Props[1].Object[n], n <= row.members ? 10 + n : 0);
+        for (int n = 1; n <= row.fixtures; ++n) {
+            EXPECT_EQ(document.Fixtures[10 + n].AssignedItem, n <= row.members ? 1 : 0) << n;
+            EXPECT_EQ(document.Fixtures[10 + n].AssignedItemName, n <= row.members ? "P" : "") << n;
+        }
+    }
+    ObjectBench bench;
+    EXPECT_FALSE(bench.propText(file("ZephProp", "2.1.0", items(1, 65) + objects(2))));
+    EXPECT_EQ(bench.failures.reports.at(0).procedure, "Zeph.modZephLoadSave.LoadProp200");
+    EXPECT_EQ(bench.simulation->PropCount, 0);
+    EXPECT_EQ(bench.simulation->FixtureCount, 2) << "the fixtures of a failed prop stay";
+    EXPECT_EQ(bench.simulation->Fixtures[2].AssignedItem, 0);
+}
+
+TEST(ObjectFiles, OldFilesKnowNeitherPixelsNorExportData) {
+    const std::string parts = "<DMX Universe=\"4\"/><Novaline_Data/><AssignedChannels><Channel ID=\"2\" Name=\"c\" "
+                              "DeviceType=\"99\" Network=\"0\" Controller=\"1\" Channel=\"1\" Color=\"0\"/>"
+                              "</AssignedChannels>";
+    ObjectBench bench;
+    ASSERT_TRUE(bench.fixtureText(file("ZephFixture", "2.1.0", objects(1, parts))));
+    EXPECT_TRUE(bench.channelsSeen);
+    const ZephFixture& fixture = bench.simulation->Fixtures[1];
+    EXPECT_EQ(fixture.DMX.Universe, 0);
+    EXPECT_EQ(fixture.ChannelCount, 2);
+    EXPECT_EQ(fixture.Channels[2].DeviceType, kDeviceCleared);
+    EXPECT_FALSE(bench.fixtureText(file("ZephFixture", "3.0.0", objects(1, parts))));
+    EXPECT_EQ(bench.simulation->FixtureCount, 1);
+}

@@ -1,0 +1,330 @@
+#include "model/editor_writer.h"
+#include "model/ui_state.h"
+#include "model/undo.h"
+#include "tests/support/limit_document.h"
+#include "tests/support/loading.h"
+#include "util/random_source.h"
+
+#include <gtest/gtest.h>
+
+namespace {
+
+struct UndoBench : LoadBench, UndoFace {
+    int ZephUIState = kStateSelectFixture;
+    ZephUndoStores stores;
+    std::vector<int> modes;
+    int replaced = 0;
+    bool restoreProperties = true;
+    UndoContext undo{context, ZephUIState, *this};
+
+    void switchMode(int uiState) override {
+        ZephUIState = uiState;
+        modes.push_back(uiState);
+    }
+    void documentReplaced() override { ++replaced; }
+
+    std::int32_t add(std::int32_t action, int object = 0, std::string_view comment = "", bool keepRedo = false) {
+        EXPECT_TRUE(ZephAddUndoDataXML(action, object, comment, keepRedo, undo, *simulation, stores));
+        return action;
+    }
+    // A whole step that changes one name.
+    void step(std::int32_t action, int fixture, std::string name) {
+        ZephStartUndoTransaction(stores);
+        add(action, fixture);
+        simulation->Fixtures[fixture].Name = std::move(name);
+        ZephCommitUndo(stores);
+    }
+    void takeBack() { EXPECT_TRUE(ZephUndoLastAction(undo, *simulation, stores, restoreProperties)); }
+    void again() { EXPECT_TRUE(ZephRedoLastAction(undo, *simulation, stores, restoreProperties)); }
+    std::string text() const { return editorText(*simulation, paths, ""); }
+    std::string name(int fixture) const { return simulation->Fixtures[fixture].Name; }
+    // What is shown for the newest step.
+    std::string undoText() const { return stores.UndoStore.back().Text; }
+};
+
+// What is written of a document that has read the text: a reader knows the device 99 by another number.
+std::string asRead(std::string text) {
+    constexpr std::string_view kWritten = "DeviceType=\"99\"";
+    for (std::size_t at = text.find(kWritten); at != std::string::npos; at = text.find(kWritten, at))
+        text.replace(at, kWritten.size(), "DeviceType=\"-1\"");
+    return text;
+}
+
+// One change of the kind that commands, dialogs and damaged files leave behind.
+void change(RandomSource& random, UndoBench& bench) {
+    ZephSimulation& document = *bench.simulation;
+    const auto pick = [&](int low, int high) { return static_cast<int>(ZephReturnRandomNumber(low, high, random)); };
+    const int f = pick(1, std::max(document.FixtureCount, 1));
+    const int p = pick(1, std::max(document.PropCount, 1));
+    ZephFixture& fixture = document.Fixtures[f];
+    switch (pick(0, 15)) {
+    case 0:
+        if (document.FixtureCount > 0) ZephDeleteThisFixture(f, true, document, bench.watcher);
+        break;
+    case 1:
+        if (document.PropCount > 0) ZephDeleteThisProp(p, document);
+        break;
+    case 2:
+        if (document.FixtureCount > 0 && document.PropCount > 0) ZephAddFixtureToProp(f, p, document);
+        break;
+    case 3:
+        if (document.FixtureCount > 0) ZephDisassociateFromProp(f, fixture.AssignedItem, document);
+        break;
+    case 4:
+        if (document.FixtureCount < 80) document.Fixtures[++document.FixtureCount] = fixture;
+        break;
+    case 5:
+        if (document.PropCount < 20) document.Props[++document.PropCount].Name = "P" + std::to_string(pick(0, 999));
+        break;
+    case 6:
+        fixture.Name = "\x01"
+                       "a\r\n\t<&>\"\xC3\xA4\x1F\xEF\xBF\xBE\xEF\xBC\x81" +
+                       std::to_string(pick(0, 999));
+        break;
+    case 7:
+        fixture.PointCount = pick(-1, 300);
+        fixture.DrawPoints[pick(1, kMaxPoints)] = {kPointBulb, -1, pick(-100000, 100000)};
+        break;
+    case 8:
+        fixture.ChannelCount = pick(-1, 20);
+        fixture.Channels[pick(1, kMaxChannels)].DeviceType = pick(-1, 2) < 0 ? kDeviceClearedInFile : pick(-5, 7);
+        break;
+    case 9:
+        fixture.Fixture_Type = pick(0, 6);
+        fixture.Kesh.Base_Unit = pick(0, 9);
+        fixture.DMX.Universe = pick(0, 9);
+        break;
+    case 10:
+        fixture.AssignedItem = pick(-2, kMaxProps + 2);
+        fixture.AssignedItemName = "stale";
+        break;
+    case 11:
+        document.Props[p].AssignedCount = pick(-1, 70);
+        document.Props[p].Object[pick(1, kMaxFixturesInProp)] = pick(-1, 2000);
+        break;
+    case 12:
+        document.Background.BackgroundType = pick(0, 2);
+        document.Background.PicFileName = (pick(0, 1) ? bench.folderPath : std::string("/")) + "house\x02.png";
+        break;
+    case 13:
+        document.Levels[pick(1, kLevels)] = {pick(0, 1) == 0, pick(0, 1) == 0, "L" + std::to_string(pick(0, 99))};
+        document.Dimmed = pick(-1, 101);
+        break;
+    case 14:  // beyond the counts, where no writer looks
+        document.Fixtures[kMaxFixtures].Name = "left behind";
+        document.Props[kMaxProps].AssignedCount = 3;
+        break;
+    default:
+        std::swap(fixture, document.Fixtures[pick(1, std::max(document.FixtureCount, 1))]);
+        break;
+    }
+}
+
+}  // namespace
+
+TEST(Undo, GivesExactlyWhatWritingAndReadingWouldGive) {
+    UndoBench bench;
+    LoadBench reader;
+    reader.paths = bench.paths;
+    SeededRandom random(7);
+    buildTypicalDocument(*bench.simulation);
+    int undone = 0;
+    for (int round = 0; round < 90 && !HasFailure(); ++round) {
+        std::vector<std::string> texts;  // the document before each step
+        const int steps = ZephReturnRandomNumber(1, 24, random);
+        for (int step = 0; step < steps; ++step) {
+            texts.push_back(asRead(bench.text()));
+            ZephStartUndoTransaction(bench.stores);
+            bench.add(kUndoChanged);
+            for (int changes = ZephReturnRandomNumber(1, 3, random); changes > 0; --changes)
+                change(random, bench);
+            ZephCommitUndo(bench.stores);
+        }
+        const std::string last = asRead(bench.text());
+        const int kept = std::min(steps, kMaxUndo);
+        for (int step = 0; step < kept; ++step, ++undone) {
+            bench.takeBack();
+            ASSERT_EQ(bench.text(), texts[texts.size() - 1 - static_cast<std::size_t>(step)]);
+        }
+        ASSERT_TRUE(loadEditorText(bench.text(), TextReading::GeneralOnly, true, reader.context, *reader.simulation));
+        for (auto flag : {&ZephSimulation::SimulationDirty, &ZephSimulation::SimulationOpen})
+            (*reader.simulation).*flag = (*bench.simulation).*flag;
+        reader.simulation->FilePath = bench.simulation->FilePath;
+        ASSERT_TRUE(*bench.simulation == *reader.simulation) << "round " << round;
+        if (round % 2 == 0) continue;
+        for (int step = 0; step < kept; ++step)
+            bench.again();
+        ASSERT_EQ(bench.text(), last);
+        if (bench.simulation->FixtureCount >= 10) continue;
+        ZephGlobalReset(true, *bench.simulation, bench.watcher);
+        buildTypicalDocument(*bench.simulation);
+    }
+    EXPECT_GT(undone, 700);
+    EXPECT_TRUE(bench.failures.reports.empty());
+    EXPECT_TRUE(bench.host.boxes.empty());
+}
+
+TEST(Undo, SharesWhatDidNotChange) {
+    UndoBench bench;
+    buildLimitDocument(*bench.simulation, {.fixtures = 60, .points = 20});
+    ZephSimulation& document = *bench.simulation;
+    const DocumentSnapshot before = takeSnapshot(document, bench.paths, {});
+    document.Fixtures[3].DrawPoints[20].Y += 15;
+    const auto shared = [&](const DocumentSnapshot& later) {
+        return std::ranges::count_if(later.Fixtures, [&](const PackedRecord& record) {
+            return std::ranges::find(before.Fixtures, record) != before.Fixtures.end();
+        });
+    };
+    EXPECT_EQ(shared(takeSnapshot(document, bench.paths, before)), 59);
+    ZephDeleteThisFixture(10, true, document, bench.watcher);
+    ZephDeleteThisFixture(30, true, document, bench.watcher);
+    EXPECT_EQ(shared(takeSnapshot(document, bench.paths, before)), 57) << "all but the changed one and the two deleted";
+    document.Fixtures[1].Channels[17 - 1].LED ^= true;
+    EXPECT_EQ(shared(takeSnapshot(document, bench.paths, before)), 56);
+}
+
+TEST(Undo, KeepsTwentyStepsAndRunsBackAndForth) {
+    UndoBench bench;
+    bench.simulation->FixtureCount = 1;
+    for (int n = 1; n <= 21; ++n)
+        bench.step(kUndoChanged, 1, std::to_string(n));
+    EXPECT_EQ(bench.stores.UndoPosition, 20);
+    bench.simulation->SimulationDirty = false;
+    bench.simulation->FileUpgraded = bench.simulation->ChecksumMismatch = true;
+    for (int n = 20; n >= 1; --n) {
+        bench.takeBack();
+        EXPECT_EQ(bench.name(1), std::to_string(n));
+    }
+    EXPECT_FALSE(bench.restoreProperties);
+    EXPECT_FALSE(bench.simulation->SimulationDirty);
+    EXPECT_FALSE(bench.simulation->FileUpgraded || bench.simulation->ChecksumMismatch) << "each load clears both";
+    EXPECT_EQ(bench.replaced, 20);
+    EXPECT_EQ(bench.watcher.clipboards, 0);
+    bench.takeBack();
+    EXPECT_EQ(bench.name(1), "1") << "nothing is left to take back";
+    EXPECT_EQ(bench.stores.RedoPosition, 20);
+    for (int n = 2; n <= 21; ++n) {
+        bench.again();
+        EXPECT_EQ(bench.name(1), std::to_string(n));
+    }
+    bench.again();
+    EXPECT_EQ(bench.name(1), "21");
+    bench.takeBack();
+    bench.step(kUndoChanged, 1, "new");
+    EXPECT_EQ(bench.stores.RedoPosition, 0) << "a new change ends what could be redone";
+    bench.again();
+    EXPECT_EQ(bench.name(1), "new");
+}
+
+TEST(Undo, DescribesEachActionAndReturnsToItsState) {
+    UndoBench bench;
+    ZephSimulation& document = *bench.simulation;
+    document.FixtureCount = 2;
+    document.PropCount = 3;
+    document.Fixtures[1].Name = "F";
+    document.Fixtures[1].AssignedItem = 3;
+    document.Props[1].Name = "P1";
+    document.Props[3].Name = "P3";
+    struct Row {
+        int state;
+        std::int32_t action;
+        int object;
+        std::int32_t kept;
+        const char* text;
+        int mode;
+    };
+    for (const Row& row : std::vector<Row>{{3, 1, 1, 1, "Deleted F", 3},
+                                           {3, 4, 1, 4, "End Drawing of F", 3},
+                                           {4, 4, 2, 4, "End New Drawing", 4},
+                                           {3, 6, 1, 6, "Cut F", 3},
+                                           {2, 6, 1, 21, "Cut P3", 2},
+                                           {2, 7, 1, 23, "Pasted P3", 2},
+                                           {2, 9, 1, 24, "Changed P3", 2},
+                                           {2, 10, 1, 25, "Sent Home P3", 2},
+                                           {2, 8, 1, 8, "Properties Change Of F", 3},
+                                           {3, 16, 1, 16, "UnLocked Fixture F", 3},
+                                           {3, 19, 1, 19, "Changed Prop P1", 2},
+                                           {3, 20, 1, 20, "Deleted P3", 3},
+                                           {3, 17, 600, 17, "Created Prop Name ", 3},
+                                           {3, 29, 1, 29, "Ran Mega Tree Wizard - 8 bundles", 3},
+                                           {4, 34, 1, 34, "Changed Editor Properties", 3},
+                                           {4, 36, 1, 36, "", 4},
+                                           {4, 99, 1, 99, "", 4}}) {
+        SCOPED_TRACE(row.text);
+        ZephStartUndoTransaction(bench.stores);
+        bench.ZephUIState = row.state;
+        EXPECT_EQ(bench.add(row.action, row.object, "8 bundles"), row.kept);
+        const ZephUndoEntry& entry = bench.stores.UndoStore.back();
+        EXPECT_EQ(entry.Action, row.kept);
+        EXPECT_EQ(entry.Text, row.text);
+        EXPECT_EQ(entry.EditorMode, row.mode);
+        EXPECT_EQ(entry.ObjectIndex, row.object);
+    }
+    ZephCommitUndo(bench.stores);
+    bench.ZephUIState = kStateSelectFixture;
+    bench.takeBack();
+    EXPECT_EQ(bench.modes, std::vector<int>{kStateDrawing});
+}
+
+TEST(Undo, ARunOfLevelStepsIsOneStep) {
+    UndoBench bench;
+    bench.simulation->FixtureCount = 2;
+    for (int press = 1; press <= 5; ++press)
+        bench.step(kUndoMovedForward, 1 + press % 2, std::to_string(press));
+    EXPECT_EQ(bench.stores.UndoPosition, 1);
+    bench.step(kUndoMovedBackward, 1, "back");
+    bench.step(kUndoMovedForward, 1, "forth");
+    EXPECT_EQ(bench.stores.UndoPosition, 3);
+    bench.step(kUndoChanged, 1, "a");
+    bench.step(kUndoChanged, 1, "b");
+    EXPECT_EQ(bench.stores.UndoPosition, 5) << "other changes each count";
+}
+
+TEST(Undo, ARollbackLeavesNoStepAndNothingToRedo) {
+    UndoBench bench;
+    bench.simulation->FixtureCount = 1;
+    bench.step(kUndoChanged, 1, "a");
+    bench.takeBack();
+    ZephStartUndoTransaction(bench.stores);
+    bench.add(kUndoChanged);
+    bench.add(kUndoChanged);
+    ZephRollbackUndo(bench.stores);
+    EXPECT_EQ(bench.stores.UndoPosition, 0);
+    EXPECT_EQ(bench.stores.UndoStore.size(), 1u);
+    EXPECT_EQ(bench.stores.RedoPosition, 0) << "the add emptied it";
+    // A transaction that nobody ended is dropped by the next.
+    bench.add(kUndoChanged);
+    bench.step(kUndoCreatedProp, 1, "b");
+    EXPECT_EQ(bench.stores.UndoPosition, 1);
+}
+
+TEST(Undo, RedoOutlivesALoadAndNamesNothing) {
+    UndoBench bench;
+    bench.simulation->FixtureCount = 1;
+    bench.step(kUndoDeletedFixture, 1, "old");
+    bench.takeBack();
+    EXPECT_EQ(ZephUndoCaptions(bench.stores).redoItem, "Redo Deleted ");
+    ZephGlobalReset(false, *bench.simulation, bench.watcher);
+    bench.stores.UndoPosition = 0;  // as the window's watcher does
+    bench.again();
+    EXPECT_EQ(bench.name(1), "old");
+    EXPECT_EQ(bench.stores.UndoPosition, 1);
+    EXPECT_EQ(bench.undoText(), "Deleted ");
+    bench.simulation->Fixtures[1].Name = "named";
+    bench.step(kUndoDeletedFixture, 1, "new");
+    const UndoCaptions captions = ZephUndoCaptions(bench.stores);
+    EXPECT_EQ(captions.undoItem, "Undo Deleted named");
+    EXPECT_EQ(captions.undoTip, "Undo: Deleted named");
+    EXPECT_EQ(captions.redoItem, "Redo");
+    EXPECT_EQ(captions.redoTip, "Redo");
+}
+
+TEST(Undo, AStepThatCannotBeKeptIsReportedAndMakesNoEntry) {
+    UndoBench bench;
+    bench.simulation->FixtureCount = kMaxFixtures + 1;  // no document has this
+    std::int32_t action = kUndoChanged;
+    EXPECT_FALSE(ZephAddUndoDataXML(action, 1, "", false, bench.undo, *bench.simulation, bench.stores));
+    EXPECT_EQ(bench.failures.reports.at(0).procedure, "Zeph.modZephUndo.ZephAddUndoDataXML");
+    ZephCommitUndo(bench.stores);
+    EXPECT_EQ(bench.stores.UndoPosition, 0);
+}
