@@ -12,11 +12,12 @@ namespace {
 class CanvasPainter {
 public:
     CanvasPainter(std::uint8_t alpha, QImage& canvas)
-        : alpha_(alpha), kernels_(fastestBlendKernels()), canvas_{{reinterpret_cast<std::uint32_t*>(canvas.bits()),
-                                                                   static_cast<std::ptrdiff_t>(canvas.bytesPerLine() /
-                                                                                               sizeof(std::uint32_t))},
-                                                                  canvas.width(),
-                                                                  canvas.height()} {}
+        : alpha_(alpha),
+          kernels_(fastestBlendKernels()), canvas_{{reinterpret_cast<std::uint32_t*>(canvas.bits()),
+                                                    canvas.bytesPerLine() /
+                                                        static_cast<std::ptrdiff_t>(sizeof(std::uint32_t))},
+                                                   canvas.width(),
+                                                   canvas.height()} {}
 
     // x, y: the middle of the bulb, in pixels.
     void draw(const BulbImage& image, std::int32_t x, std::int32_t y) const {

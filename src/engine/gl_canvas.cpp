@@ -176,7 +176,7 @@ void GLCanvas::upload(const GLWork& work) {
         const auto first = static_cast<std::size_t>(work.FirstSlot);
         fillBuffer(kSlotColors, GL_TEXTURE_BUFFER, slotBytes_, nullptr, GL_STREAM_DRAW);
         api_.BufferSubData(GL_TEXTURE_BUFFER, static_cast<GLintptr>(first * sizeof(std::uint32_t)),
-                           static_cast<GLsizeiptr>((work.EndSlot - work.FirstSlot) * sizeof(std::uint32_t)),
+                           static_cast<GLsizeiptr>((work.EndSlot - work.FirstSlot) * GLsizeiptr{sizeof(std::uint32_t)}),
                            work.SlotColors.data() + first);
     }
     if (!work.Instances.empty()) {

@@ -77,7 +77,7 @@ TEST(BlendKernels, AllFormsGiveThePixelsOfTheReference) {
         }
         std::vector<std::uint32_t> before(kWidth * kHeight);
         for (std::uint32_t& pixel : before)
-            pixel = 0xFF000000U | ZephReturnRandomNumber(0, kWhite, random);
+            pixel = 0xFF000000U | static_cast<unsigned>(ZephReturnRandomNumber(0, kWhite, random));
         const RowRange rows{ZephReturnRandomNumber(0, 60, random), ZephReturnRandomNumber(61, kHeight, random)};
 
         const auto blended = [&](BlendForm form) {
