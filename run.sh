@@ -26,8 +26,9 @@ if [ -z "${DISPLAY:-}${WAYLAND_DISPLAY:-}" ]; then
     exit 0
 fi
 
-build/release/bin/zeph-tool send "$show" --loop &
+build/release/bin/zeph-tool send "$show" --loop --on-request &
 player=$!
 trap 'kill $player 2>/dev/null || true' EXIT
-echo "The show plays to UDP port 30303, and the window simulates it. Esc or Stop leads to the editor, F5 back."
+echo "The show plays to UDP port 30303, and the window simulates it. Play and Halt start and stop the show;"
+echo "Esc or Stop leads to the editor, F5 back."
 build/release/bin/zeph --simulate "$@" "$display"

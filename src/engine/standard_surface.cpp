@@ -44,11 +44,14 @@ bool StandardSurface::prepare(const SurfaceScene& scene, FailureReport& failures
         byUnit->assign(plan_.Units.size(), 0);
     }
     notedWhole_.reserve(plan_.Units.size());
+    lastNotedWhole_.reserve(plan_.Units.size());
     listed_.reserve(listed);
     for (BandLists* lists : {&bandListed_, &lastListed_}) {
         lists->Items.assign(plan_.BandItems.size() + listed_.capacity() * bandsOfBulb, {});
         lists->First.assign(bands + 1, 0);
     }
+    alone_.assign(lastListed_.Items.size(), 0);
+    covered_.assign(static_cast<std::size_t>(kBandRows * coveredWords(plan_.Width)), 0);
     for (SavedPixels* saved : {&saved_, &lastSaved_}) {
         // A bulb of the smallest size saves twice its pixels.
         saved->Pixels.resize(2 * static_cast<std::size_t>(thinLimit_));
@@ -75,6 +78,9 @@ void StandardSurface::release() {
     band_ = {};
     bandListed_ = {};
     lastListed_ = {};
+    lastNotedWhole_.clear();
+    alone_.clear();
+    covered_.clear();
     saved_ = {};
     lastSaved_ = {};
     notedWhole_.clear();

@@ -60,6 +60,11 @@ public:
 private:
     static constexpr std::int32_t kBandMarginRows = 4;  // bulbs of size 2 are painted whole, over the band's edge
 
+    static constexpr std::int32_t kCoveredMargin = 128;  // pixels; the largest image hangs out of the canvas no farther
+    static constexpr std::int32_t coveredWords(std::int32_t width) noexcept {
+        return (width + 2 * kCoveredMargin) / 64 + 1;
+    }
+
     enum class BandLight : std::uint8_t {
         None,    // shows the background
         Whole,   // shows the units of lastWhole_: it stays while those do
@@ -103,6 +108,10 @@ private:
     void paintBandDense(std::size_t band);
     void paintThin();
     void paintBandThin(std::size_t band);
+    bool showsLastList() const noexcept;
+    void paintThinAgain();
+    void paintBandThinAgain(std::size_t band);
+    void findAlone();
     void paintOver();
 
     std::uint64_t restoreBand(std::size_t band, std::span<const BulbItem> last);
@@ -150,6 +159,12 @@ private:
     BandLists lastListed_;
     SavedPixels lastSaved_;
     std::vector<BandLight> bandLight_;
-    bool lastRepeats_ = false;   // lastWhole_ and the images tell all of it
-    bool wholeChanged_ = false;  // the background was replaced
+    std::vector<std::int32_t> lastNotedWhole_;
+    // Of the items of lastListed_: 1 = no earlier one of the band lies under any of its pixels, so that what was saved
+    // there is the background whatever the others show. Found when a list is painted for the second time.
+    std::vector<std::uint8_t> alone_;
+    bool aloneFound_ = false;
+    std::vector<std::uint64_t> covered_;  // work space of findAlone: a bit a pixel of a band and its margins
+    bool lastRepeats_ = false;            // lastWhole_ and the images tell all of it
+    bool wholeChanged_ = false;           // the background was replaced
 };

@@ -28,6 +28,15 @@ void copyFours(const std::uint32_t* from, std::uint32_t* to, std::int32_t pixels
         copyPixels(from + x, to + x, 4);
 }
 
+// The rows of a square from one place to another; strides are pixels.
+template <typename Square>
+void copySquare(const std::uint32_t* from, std::ptrdiff_t fromStride, std::uint32_t* to, std::ptrdiff_t toStride,
+                const Square& square) noexcept {
+    for (std::int32_t y = square.Top; y < square.Bottom; ++y, from += fromStride, to += toStride) {
+        copyFours(from, to, square.Width);
+    }
+}
+
 // A counting sort: forEach visits the items in the order of painting, twice, and that order stays within a band.
 template <typename ForEach>
 void sortIntoBands(const FramePlan& plan, ForEach forEach, std::vector<BulbItem>& sorted,
@@ -92,6 +101,8 @@ void StandardSurface::paintNoted() {
         if (!repeats || !lastRepeats_ || anySpriteChanged_ || whole_ != lastWhole_) {
             if (worthBands()) {
                 paintDense();
+            } else if (repeats && lastRepeats_ && notedWhole_ == lastNotedWhole_ && showsLastList()) {
+                paintThinAgain();
             } else {
                 paintThin();
             }
@@ -103,6 +114,7 @@ void StandardSurface::paintNoted() {
     ++passes_;
     std::fill(alpha_.begin(), alpha_.end(), std::uint8_t{0});
     std::fill(whole_.begin(), whole_.end(), std::uint8_t{0});
+    if (passes_ == 1) notedWhole_.swap(lastNotedWhole_);
     notedWhole_.clear();
     listed_.clear();
     lastUnit_ = 0;
@@ -227,6 +239,80 @@ void StandardSurface::paintThin() {
         paintBandThin(band);
     std::swap(bandListed_, lastListed_);
     std::swap(saved_, lastSaved_);
+    aloneFound_ = false;
+}
+
+bool StandardSurface::showsLastList() const noexcept {
+    return std::ranges::none_of(
+        bandLight_, [](BandLight light) { return light == BandLight::Whole || light == BandLight::Unknown; });
+}
+
+// The same bulbs as in the frame before at other strengths, as in every fade: the lists stand, and so does what was
+// saved under the bulbs that lie alone, which are therefore touched once instead of twice.
+void StandardSurface::paintThinAgain() {
+    if (!aloneFound_) findAlone();
+    for (std::size_t band = 0; band < bandLight_.size(); ++band) {
+        const std::span<const BulbItem> items = lastListed_.of(band);
+        const bool same = std::ranges::all_of(items, [&](const BulbItem& item) {
+            const auto unit = static_cast<std::size_t>(item.Unit);
+            return alpha_[unit] == lastAlpha_[unit] && spriteChanged_[unit] == 0;
+        });
+        if (!same) paintBandThinAgain(band);
+    }
+}
+
+void StandardSurface::paintBandThinAgain(std::size_t band) {
+    const RowRange rows = bandRows(band);
+    const std::span<const BulbItem> items = lastListed_.of(band);
+    const std::uint8_t* const alone = alone_.data() + lastListed_.First[band];
+    // Those that lie over others are taken away first, from the top down.
+    std::uint32_t* saved = lastSaved_.Pixels.data() + lastSaved_.End[band + 1];
+    for (std::size_t i = items.size(); i-- > 0;) {
+        const Square square = squareOf(items[i], rows);
+        saved -= square.Width * (square.Bottom - square.Top);
+        if (alone[i] == 0)
+            copySquare(saved, square.Width, frame_.row(square.Top) + square.Left, frame_.stride(), square);
+    }
+    const PixelTarget target{frame_.row(0), frame_.stride()};
+    std::uint64_t tiles = 0;
+    for (std::size_t i = 0; i < items.size(); ++i) {
+        if (i + kFetchAhead < items.size()) fetchItem(items[i + kFetchAhead]);
+        const Square square = squareOf(items[i], rows);
+        std::uint32_t* const lit = frame_.row(square.Top) + square.Left;
+        if (alone[i] != 0) {
+            copySquare(saved, square.Width, lit, frame_.stride(), square);
+        } else {
+            copySquare(lit, frame_.stride(), saved, square.Width, square);
+        }
+        kernels_.blendItems(items.subspan(i, 1), alpha_.data(), plan_.Sprites.data(), rows, target);
+        saved += square.Width * (square.Bottom - square.Top);
+        tiles |= tilesOf(items[i]);
+    }
+    tellTiles(band, tiles);
+}
+
+void StandardSurface::findAlone() {
+    const std::int32_t words = coveredWords(plan_.Width);
+    for (std::size_t band = 0; band < bandLight_.size(); ++band) {
+        const RowRange rows = bandRows(band);
+        const std::span<const BulbItem> items = lastListed_.of(band);
+        std::fill(covered_.begin(), covered_.end(), std::uint64_t{0});
+        for (std::size_t i = 0; i < items.size(); ++i) {
+            const Square square = squareOf(items[i], rows);
+            bool alone = true;
+            for (std::int32_t y = square.Top; y < square.Bottom; ++y) {
+                std::uint64_t* const row = covered_.data() + (y - rows.Top) * words;
+                for (std::int32_t x = square.Left + kCoveredMargin; x < square.Left + kCoveredMargin + square.Width;
+                     ++x) {
+                    const std::uint64_t bit = std::uint64_t{1} << (x & 63);
+                    alone = alone && (row[x >> 6] & bit) == 0;
+                    row[x >> 6] |= bit;
+                }
+            }
+            alone_[static_cast<std::size_t>(lastListed_.First[band]) + i] = alone ? 1 : 0;
+        }
+    }
+    aloneFound_ = true;
 }
 
 void StandardSurface::paintBandThin(std::size_t band) {
@@ -275,10 +361,7 @@ std::uint64_t StandardSurface::restoreBand(std::size_t band, std::span<const Bul
         if (i >= kFetchAhead) fetchItem(last[i - kFetchAhead]);
         const Square square = squareOf(last[i], rows);
         from -= square.Width * (square.Bottom - square.Top);
-        const std::uint32_t* row = from;
-        for (std::int32_t y = square.Top; y < square.Bottom; ++y, row += square.Width) {
-            copyFours(row, frame_.row(y) + square.Left, square.Width);
-        }
+        copySquare(from, square.Width, frame_.row(square.Top) + square.Left, frame_.stride(), square);
         tiles |= tilesOf(last[i]);
     }
     return tiles;
@@ -286,10 +369,8 @@ std::uint64_t StandardSurface::restoreBand(std::size_t band, std::span<const Bul
 
 void StandardSurface::saveUnder(const BulbItem& item, RowRange rows) {
     const Square square = squareOf(item, rows);
-    std::uint32_t* to = saved_.Pixels.data() + saved_.Used;
-    for (std::int32_t y = square.Top; y < square.Bottom; ++y, to += square.Width) {
-        copyFours(frame_.row(y) + square.Left, to, square.Width);
-    }
+    copySquare(frame_.row(square.Top) + square.Left, frame_.stride(), saved_.Pixels.data() + saved_.Used, square.Width,
+               square);
     saved_.Used += square.Width * (square.Bottom - square.Top);
 }
 

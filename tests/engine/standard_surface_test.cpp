@@ -35,8 +35,9 @@ void comparePictures(std::uint64_t seed, const BlendKernels& kernels) {
     std::vector<Call> calls;
     for (int n = 0; n < 10; ++n) {
         constexpr std::array kShares{100, 5, 40, 0, 90};
-        const std::int32_t kind = stage.pick(1, 6);
-        if (kind > 1) calls = stage.frame(kShares[static_cast<std::size_t>(stage.pick(0, 4))]);
+        const std::int32_t kind = stage.pick(1, 8);
+        if (kind >= 7) stage.fade(calls);
+        if (kind > 1 && kind < 7) calls = stage.frame(kShares[static_cast<std::size_t>(stage.pick(0, 4))]);
         if (kind == 2 && calls.size() > 1) std::reverse(calls.begin(), calls.end());
         if (kind == 3) calls.insert(calls.end(), calls.begin(), calls.begin() + std::ssize(calls) / 2);
         if (kind == 4 && n > 4) {

@@ -121,6 +121,16 @@ public:
         return calls;
     }
 
+    // The same calls at other strengths, one in three as it was.
+    void fade(std::vector<Call>& calls) {
+        for (Call& call : calls) {
+            if (pick(1, 3) == 1) continue;
+            const auto alpha = static_cast<std::uint8_t>(pick(1, 255));
+            if (call.channel) call.channel->Alpha = alpha;
+            if (call.group && call.group->Alpha != 0) call.group->Alpha = alpha;
+        }
+    }
+
     std::int32_t pick(std::int32_t low, std::int32_t high) { return ZephReturnRandomNumber(low, high, random_); }
     SeededRandom& random() { return random_; }
 

@@ -39,6 +39,7 @@ SequencerDesk::SequencerDesk(SettingsStore& store) : store_(store) {
 SequencerDesk::~SequencerDesk() {
     // Another that registered since then keeps its place.
     try {
+        store_.flush();
         if (store_.value(kSharedIpcKey, kSeqPid) != std::to_string(ownProcess())) return;
         store_.setValue(kSharedIpcKey, kSeqPid, "0");
         store_.flush();
