@@ -43,4 +43,4 @@ BUILD_PACKAGES=(g++ cmake ninja-build ccache pkg-config qt6-base-dev qt6-svg-dev
 # What looking at the result takes besides: the platform plugin's own needs come with qt6-base-dev.
 RUN_PACKAGES=(ffmpeg libgl1-mesa-dri)
 # What checking takes besides.
-TEST_PACKAGES=(clang-14 libclang-rt-14-dev clang-format-14 python3 xvfb xauth)
+TEST_PACKAGES=(git clang-14 libclang-rt-14-dev clang-format-14 python3 xvfb xauth)
