@@ -22,6 +22,7 @@ struct WideRecord {
     std::int32_t key = 0;
     std::array<ZephRenderSlot, 17> slots{};
     ZephRenderLive live{};
+    bool newCommand = false;
 };
 
 struct PlainSink : CommandSink {
@@ -37,11 +38,11 @@ struct PlainSink : CommandSink {
             const auto found = std::lower_bound(records.begin(), records.end(), key,
                                                 [](const WideRecord& r, std::int32_t k) { return r.key < k; });
             if (found == records.end() || found->key != key) continue;
-            found->live.EffectType = address.EffectType;
+            found->live.EffectType = static_cast<std::uint8_t>(address.EffectType);
             found->live.Duration = command.Timing.Duration;
-            found->live.StartIntensity = command.Timing.StartIntensity;
-            found->live.EndIntensity = command.Timing.EndIntensity;
-            found->live.NewCommand = true;
+            found->live.StartIntensity = static_cast<std::uint8_t>(command.Timing.StartIntensity);
+            found->live.EndIntensity = static_cast<std::uint8_t>(command.Timing.EndIntensity);
+            found->newCommand = true;
         }
     }
     std::int32_t virtualChannelKey(std::string_view) const override { return 0; }
@@ -90,10 +91,9 @@ double ourWay(const std::string& stream, BenchDisplay& display) {
         31,
         [&] {
             channels.ZephStackBuffer.append(stream);
-            for (const std::int32_t e : display.tables.NewEntries) {
-                display.tables.Live[static_cast<std::size_t>(e)].NewCommand = false;
-            }
-            display.tables.NewEntries.clear();
+            // As a pass does: the next commands are new again.
+            std::ranges::fill(display.tables.CommandState, kCommandActive);
+            display.tables.NewEntryCount = 0;
         },
         [&] { ZephProcessPayloads(true, setup, sink, display.failures, channels); });
 }

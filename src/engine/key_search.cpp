@@ -26,16 +26,24 @@ __attribute__((target("avx2,popcnt"))) inline std::int32_t notAbove(const std::i
 }  // namespace
 
 void KeySearch::clear() {
-    count_ = 0;
+    runs_.clear();
     blocks_.clear();
     levels_.clear();
 }
 
 void KeySearch::build(std::span<const std::int32_t> sorted) {
     clear();
-    count_ = static_cast<std::int32_t>(sorted.size());
-    if (count_ == 0) return;
-    std::vector<std::int32_t> level(sorted.begin(), sorted.end());
+    if (sorted.empty()) return;
+    lowest_ = sorted.front();
+    std::vector<std::int32_t> level;
+    for (std::size_t i = 0; i < sorted.size(); ++i) {
+        if (i == 0 || std::int64_t{sorted[i]} != std::int64_t{sorted[i - 1]} + 1) {
+            level.push_back(sorted[i]);
+            runs_.push_back({0, static_cast<std::int32_t>(static_cast<std::uint32_t>(i + 1) -
+                                                          static_cast<std::uint32_t>(sorted[i]))});
+        }
+        runs_.back().lastKey = sorted[i];
+    }
     for (;;) {
         const std::size_t levelBlocks = (level.size() + kBlock - 1) / kBlock;
         levels_.push_back({static_cast<std::int32_t>(blocks_.size()), static_cast<std::int32_t>(levelBlocks) - 1});
@@ -52,8 +60,14 @@ void KeySearch::build(std::span<const std::int32_t> sorted) {
     }
 }
 
+inline std::int32_t KeySearch::positionIn(std::int32_t run0, std::int32_t key) const noexcept {
+    const Run& run = runs_[std::min(static_cast<std::size_t>(run0), runs_.size() - 1)];
+    const std::uint32_t position = static_cast<std::uint32_t>(key) + static_cast<std::uint32_t>(run.shift);
+    return lowest_ <= key && key <= run.lastKey ? static_cast<std::int32_t>(position) : 0;
+}
+
 std::int32_t KeySearch::findPortable(std::int32_t key) const noexcept {
-    if (count_ == 0) return 0;
+    if (runs_.empty()) return 0;
     std::int32_t index = 0;
     for (std::size_t level = levels_.size(); level-- > 0;) {
         // The highest key possible is not above the padding either, and would lead past the end of the level.
@@ -64,9 +78,7 @@ std::int32_t KeySearch::findPortable(std::int32_t key) const noexcept {
             atMost += head <= key ? 1 : 0;
         index = inLevel * kBlock + std::max(atMost - 1, 0);
     }
-    index = std::min(index, count_ - 1);
-    const Block& block = blocks_[static_cast<std::size_t>(index / kBlock)];
-    return block.keys[static_cast<std::size_t>(index % kBlock)] == key ? index + 1 : 0;
+    return positionIn(index, key);
 }
 
 #if defined(__x86_64__)
@@ -88,17 +100,14 @@ __attribute__((target("avx2,popcnt"))) void KeySearch::findManyVector(std::span<
                 index[lane] = inLevel * kBlock + (atMost > 0 ? atMost - 1 : 0);
             }
         }
-        for (std::size_t lane = 0; lane < lanes; ++lane) {
-            const std::int32_t place = std::min(index[lane], count_ - 1);
-            const std::int32_t found = blocks[place / kBlock].keys[static_cast<std::size_t>(place % kBlock)];
-            positions[done + lane] = found == keys[done + lane] ? place + 1 : 0;
-        }
+        for (std::size_t lane = 0; lane < lanes; ++lane)
+            positions[done + lane] = positionIn(index[lane], keys[done + lane]);
         done += lanes;
     }
 }
 
 void KeySearch::findMany(std::span<const std::int32_t> keys, std::int32_t* positions) const noexcept {
-    if (count_ == 0) {
+    if (runs_.empty()) {
         std::fill_n(positions, keys.size(), 0);
     } else if (__builtin_cpu_supports("avx2")) {
         findManyVector(keys, positions);

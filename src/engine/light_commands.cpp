@@ -6,22 +6,21 @@
 
 namespace {
 
-void file(std::int32_t entry, const ZephChannelCommand& command, std::int32_t nowMs, ZephRenderTables& tables) {
-    ZephRenderLive& live = tables.Live[static_cast<std::size_t>(entry)];
-    // What the channel was doing is forgotten, but for the phase of its twinkle, which goes on across commands.
-    live.CommandType = command.Command.CommandType;
-    live.EffectType = command.Command.EffectType;
-    live.Duration = command.Timing.Duration;
-    live.StartIntensity = command.Timing.StartIntensity;
-    live.EndIntensity = command.Timing.EndIntensity;
-    live.LastEffectTime = 0;
-    live.StartTime = nowMs;
-    tables.CommandActive[static_cast<std::size_t>(entry)] = 1;
-    tables.LevelChanged |= live.LevelUsed;
-    if (!live.NewCommand) {
-        live.NewCommand = true;
-        tables.NewEntries.push_back(entry);
-    }
+// What the channel was doing is forgotten, but for the phase of its twinkle.
+inline void file(std::int32_t entry, const ZephChannelCommand& command, std::int32_t nowMs, ZephRenderTables& tables) {
+    const auto index = static_cast<std::size_t>(entry);
+    tables.Live[index] = {.StartTime = nowMs,
+                          .Duration = command.Timing.Duration,
+                          .LastEffectTime = 0,
+                          .CommandType = static_cast<std::uint8_t>(command.Command.CommandType),
+                          .EffectType = static_cast<std::uint8_t>(command.Command.EffectType),
+                          .StartIntensity = static_cast<std::uint8_t>(command.Timing.StartIntensity),
+                          .EndIntensity = static_cast<std::uint8_t>(command.Timing.EndIntensity)};
+    // Noted each time and counted once: whether a channel was noted already follows no pattern to jump by.
+    std::uint8_t& state = tables.CommandState[index];
+    tables.NewEntries[tables.NewEntryCount] = entry;
+    tables.NewEntryCount += (state & kCommandNew) == 0 ? 1 : 0;
+    state = kCommandActive | kCommandNew;
 }
 
 std::int32_t commandKey(const ZephLightCommand& command) {

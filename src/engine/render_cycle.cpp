@@ -19,8 +19,8 @@ std::int32_t presentIntensity(const ZephRenderLive& live, std::int32_t nowMs) {
     const std::int32_t elapsed = std::max(nowMs - live.StartTime, 0);
     if (live.Duration <= 0 || elapsed > live.Duration) return live.EndIntensity;
     const double done = static_cast<double>(elapsed) / live.Duration;
-    const std::int32_t intensity =
-        roundHalfEven(live.StartIntensity + (live.EndIntensity - live.StartIntensity) * done);
+    const std::int32_t change = live.EndIntensity - live.StartIntensity;
+    const std::int32_t intensity = roundHalfEven(live.StartIntensity + change * done);
     // A fade that rises must not be taken for one that has ended at 0.
     const bool rises = live.EndIntensity > live.StartIntensity && live.LastEffectTime != 0;
     return intensity == 0 && rises ? 1 : intensity;
@@ -44,7 +44,7 @@ void driveColour(const ZephRenderSlot& slot, std::int32_t intensity, EntryPass& 
     if (slot.Channel < 1 || slot.Channel > 3) return;  // a colour that the group has no place for
     ZephRGBData& group = context.tables.RGBData[static_cast<std::size_t>(slot.RGBIndex)];
     std::int32_t& mode = group.Mode[static_cast<std::size_t>(slot.Channel)];
-    if (mode == kModeReleased && pass.live.NewCommand) mode = 0;
+    if (mode == kModeReleased && (context.tables.CommandState[pass.index] & kCommandNew) != 0) mode = 0;
     if (mode != 0 && mode != kModePlain) return;  // a colour effect owns this colour
     const bool effect = pass.live.EffectType == kEffectShimmer || pass.live.EffectType == kEffectTwinkle;
     if (!effect) {
@@ -68,20 +68,21 @@ std::int32_t plainIntensity(std::int32_t intensity, EntryPass& pass, RenderConte
     case kEffectShimmer:
         return context.clocks.ShimmerPhase ? intensity : 0;
     case kEffectTwinkle:
-        return ChannelTwinkle(intensity, pass.live, pass.nowMs, context.random);
+        return ChannelTwinkle(intensity, context.tables.Twinkle[pass.index], pass.nowMs, context.random);
     default:
         return intensity;
     }
 }
 
 void driveSlot(const ZephRenderSlot& slot, EntryPass& pass, RenderContext& context) {
-    std::uint8_t& active = context.tables.CommandActive[pass.index];
+    std::uint8_t& state = context.tables.CommandState[pass.index];
     std::int32_t intensity = presentIntensity(pass.live, pass.nowMs);
     // A command ends in the pass after the one that carried its 0 out, so it takes two at least.
     if (intensity < 1 && pass.live.LastEffectTime != 0) {
-        active = 0;
-        pass.live.NextTwinkleTime = 0;
+        state &= static_cast<std::uint8_t>(~kCommandActive);
+        context.tables.Twinkle[pass.index].NextTwinkleTime = 0;
     }
+    const bool active = (state & kCommandActive) != 0;
     if (slot.KeshMagic != 0) {
         if (active) driveMagic(slot, intensity, pass, context);
     } else if (slot.isRGB()) {
@@ -102,7 +103,7 @@ void driveEntries(std::size_t level, std::int32_t nowMs, RenderContext& context)
     ZephRenderTables& tables = context.tables;
     for (const std::int32_t e : tables.LevelEntries[level]) {
         const std::size_t index = static_cast<std::size_t>(e);
-        if (!tables.CommandActive[index]) continue;
+        if ((tables.CommandState[index] & kCommandActive) == 0) continue;
         EntryPass pass{index, tables.Live[index], nowMs};
         const ZephRenderData& entry = tables.RenderData[index];
         for (std::int32_t s = entry.FirstSlot; s < entry.FirstSlot + entry.SlotCount; ++s) {
@@ -113,9 +114,17 @@ void driveEntries(std::size_t level, std::int32_t nowMs, RenderContext& context)
     }
     // For every entry, on this level or not: slots on a higher level see the command as no longer new. That is how a
     // channel on two levels has always behaved.
-    for (const std::int32_t e : tables.NewEntries)
-        tables.Live[static_cast<std::size_t>(e)].NewCommand = false;
-    tables.NewEntries.clear();
+    for (std::size_t n = 0; n < tables.NewEntryCount; ++n) {
+        tables.CommandState[static_cast<std::size_t>(tables.NewEntries[n])] &= static_cast<std::uint8_t>(~kCommandNew);
+    }
+    tables.NewEntryCount = 0;
+}
+
+// The levels of commands that came since the last pass have something to show.
+void markNewLevels(ZephRenderTables& tables) {
+    for (std::size_t n = 0; n < tables.NewEntryCount; ++n) {
+        tables.LevelChanged |= tables.RenderData[static_cast<std::size_t>(tables.NewEntries[n])].LevelUsed;
+    }
 }
 
 void drawGroups(std::size_t level, std::int32_t nowMs, RenderContext& context) {
@@ -156,6 +165,7 @@ void ZephRenderLights(std::int32_t nowMs, RenderContext& context) try {
         context.clocks.ShimmerPhase = !context.clocks.ShimmerPhase;
         context.clocks.ShimmerClock = 0;
     }
+    markNewLevels(context.tables);
     context.surface.beginFrame();
     for (std::size_t level = 1; level <= kLevels; ++level) {
         const std::uint32_t bit = 1u << level;

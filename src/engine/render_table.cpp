@@ -23,18 +23,6 @@ struct Address {
     bool wantsGroup = false;  // the slot drives a colour of an RGB group
 };
 
-// Packs an address in decimal. Nothing where it does not fit 32 bits.
-std::optional<std::int32_t> packedKey(std::int64_t deviceType, std::int64_t network, std::int64_t unit,
-                                      std::int64_t circuit) {
-    const std::int64_t key = deviceType == kDeviceDmx
-                                 ? deviceType * 100'000'000 + network * 100'000 + circuit
-                                 : deviceType * 100'000'000 + network * 1'000'000 + unit * 1'000 + circuit;
-    if (key < std::numeric_limits<std::int32_t>::min() || key > std::numeric_limits<std::int32_t>::max()) {
-        return std::nullopt;
-    }
-    return static_cast<std::int32_t>(key);
-}
-
 class TableBuilder {
 public:
     explicit TableBuilder(RenderBuildContext& context)
@@ -280,10 +268,9 @@ void TableBuilder::compile() {
 
     tables_.Search.build(std::span(tables_.Keys).subspan(1));
     tables_.Live.assign(tables_.RenderData.size(), {});
-    for (std::size_t e = 1; e < tables_.Live.size(); ++e)
-        tables_.Live[e].LevelUsed = tables_.RenderData[e].LevelUsed;
-    tables_.CommandActive.assign(tables_.RenderData.size(), 0);
-    tables_.NewEntries.reserve(tables_.RenderData.size());
+    tables_.Twinkle.assign(tables_.RenderData.size(), {});
+    tables_.CommandState.assign(tables_.RenderData.size(), 0);
+    tables_.NewEntries.assign(tables_.RenderData.size(), 0);
     listLevels();
 }
 
@@ -399,10 +386,6 @@ void restoreAssembledPoints(ZephSimulation& simulation, ZephFixtureStates& state
         simulation.Fixtures[f].PointCount = states[f].SavedPointCount;
         states[f].Assembled = false;
     }
-}
-
-std::int32_t BuildCmdKey(std::int32_t deviceType, std::int32_t network, std::int32_t unit, std::int32_t circuit) {
-    return packedKey(deviceType, network, unit, circuit).value_or(0);
 }
 
 std::int32_t ZephReturnVirtualChannelKey(std::string_view name, const ZephRenderTables& tables) {

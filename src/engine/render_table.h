@@ -2,6 +2,7 @@
 // erased when it is left. All arrays count from 1; index 0 exists and stays empty.
 #pragma once
 
+#include "engine/channel_key.h"
 #include "engine/fixture_state.h"
 #include "engine/key_search.h"
 #include "model/settings.h"
@@ -38,19 +39,26 @@ struct ZephRenderData {
     std::uint32_t LevelUsed = 0;  // bit of the level number set for each level on which a slot lies
 };
 
-// The live half of an entry: what its channel is doing. In an array of its own, so that filing a command touches one
-// cache line. Whether a command is active stands in ZephRenderTables::CommandActive, which a pass scans.
+// The live half of an entry: the command that its channel carries out, as it was filed. Filing writes it whole and
+// reads nothing of it, four of them share a cache line.
 struct ZephRenderLive {
-    std::int32_t CommandType = 0;
-    std::int32_t EffectType = 0;  // 0 plain, 1 shimmer, 2 twinkle
-    std::int32_t StartTime = 0;   // ms of the light clock
-    std::int32_t StartIntensity = 0;
-    std::int32_t EndIntensity = 0;     // 0..100
-    std::int32_t Duration = 0;         // ms
-    std::int32_t LastEffectTime = 0;   // 0 before the first effect step
-    std::int32_t NextTwinkleTime = 0;  // 0 = not started
-    std::uint32_t LevelUsed = 0;       // copy of the entry's, so that filing need not look there
-    bool NewCommand = false;
+    std::int32_t StartTime = 0;       // ms of the light clock
+    std::int32_t Duration = 0;        // ms
+    std::int32_t LastEffectTime = 0;  // 0 before the first effect step
+    std::uint8_t CommandType = 0;
+    std::uint8_t EffectType = 0;      // 0 plain, 1 shimmer, 2 twinkle
+    std::uint8_t StartIntensity = 0;  // 0..100
+    std::uint8_t EndIntensity = 0;    // 0..100
+};
+static_assert(sizeof(ZephRenderLive) == 16);
+
+// Bits of ZephRenderTables::CommandState.
+inline constexpr std::uint8_t kCommandActive = 1;  // a command runs on the entry
+inline constexpr std::uint8_t kCommandNew = 2;     // NewCommand: no pass has seen it yet
+
+// The phase of an entry's twinkle. It goes on across commands, so filing leaves it alone.
+struct ZephTwinklePhase {
+    std::int32_t NextTwinkleTime = 0;  // ms of the light clock, 0 = not started
     bool TwinkleOn = false;
 };
 
@@ -78,8 +86,10 @@ struct ZephRenderTables {
     KeySearch Search;                  // finds a key's place in Keys
     std::vector<ZephRenderData> RenderData;
     std::vector<ZephRenderLive> Live;
-    std::vector<std::uint8_t> CommandActive;  // 0 or 1: a command runs on the entry
-    std::vector<std::int32_t> NewEntries;     // entries whose NewCommand is set
+    std::vector<ZephTwinklePhase> Twinkle;
+    std::vector<std::uint8_t> CommandState;  // kCommandActive, kCommandNew; bytes, since every pass scans them
+    std::vector<std::int32_t> NewEntries;    // the first NewEntryCount: entries whose command is new
+    std::size_t NewEntryCount = 0;
     std::vector<ZephRenderSlot> Slots;
     std::vector<ZephRGBData> RGBData;
     std::int32_t VirtualChannelCount = 0;
@@ -112,11 +122,6 @@ void eraseRenderTables(ZephRenderTables& tables);
 
 // Gives every main ribbon and pixel fixture that this run assembled its own points back.
 void restoreAssembledPoints(ZephSimulation& simulation, ZephFixtureStates& states);
-
-// Keys of addresses; 0 where the address has none. Decimal packing in 64 bits; what does not fit 32 has no key.
-std::int32_t BuildCmdKey(std::int32_t deviceType, std::int32_t network, std::int32_t unit, std::int32_t circuit);
-std::int32_t BuildKeshRenderKey(std::int32_t network, std::int32_t unit, std::int32_t circuit);
-std::int32_t BuildPixelRenderKey(std::int32_t universe, std::int32_t channel);
 
 // Position of a name among the virtual channels, from 1; 0 = absent. Any case; UTF-8.
 std::int32_t ZephReturnVirtualChannelKey(std::string_view name, const ZephRenderTables& tables);

@@ -124,15 +124,15 @@ std::optional<Target> targetOf(const ZephRenderSlot& slot, RenderContext& contex
 
 }  // namespace
 
-std::int32_t ChannelTwinkle(std::int32_t intensity, ZephRenderLive& entry, std::int32_t nowMs, RandomSource& random) {
-    if (entry.NextTwinkleTime == 0) {
-        entry.NextTwinkleTime = nowMs + 10 * ZephReturnRandomNumber(1, 17, random);
-        entry.TwinkleOn = ZephReturnRandomNumber(1, 2, random) == 1;
-    } else if (entry.NextTwinkleTime <= nowMs) {
-        entry.TwinkleOn = !entry.TwinkleOn;
-        entry.NextTwinkleTime = nowMs + twinklePhaseMs(entry.TwinkleOn ? 0 : kTwinkleLeastOff, random);
+std::int32_t ChannelTwinkle(std::int32_t intensity, ZephTwinklePhase& phase, std::int32_t nowMs, RandomSource& random) {
+    if (phase.NextTwinkleTime == 0) {
+        phase.NextTwinkleTime = nowMs + 10 * ZephReturnRandomNumber(1, 17, random);
+        phase.TwinkleOn = ZephReturnRandomNumber(1, 2, random) == 1;
+    } else if (phase.NextTwinkleTime <= nowMs) {
+        phase.TwinkleOn = !phase.TwinkleOn;
+        phase.NextTwinkleTime = nowMs + twinklePhaseMs(phase.TwinkleOn ? 0 : kTwinkleLeastOff, random);
     }
-    return entry.TwinkleOn ? intensity : 0;
+    return phase.TwinkleOn ? intensity : 0;
 }
 
 bool TwinkleRGB(const ZephRenderSlot& slot, const RgbEffectStep& step, RenderContext& context) {

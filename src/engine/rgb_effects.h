@@ -27,7 +27,7 @@ struct RgbEffectStep {
 };
 
 // The intensity 0..100 that a twinkling plain channel shows now: the given one or 0.
-std::int32_t ChannelTwinkle(std::int32_t intensity, ZephRenderLive& entry, std::int32_t nowMs, RandomSource& random);
+std::int32_t ChannelTwinkle(std::int32_t intensity, ZephTwinklePhase& phase, std::int32_t nowMs, RandomSource& random);
 
 // Both give true where the entry's step counts as taken. A slot of a colour above 3 does nothing.
 bool TwinkleRGB(const ZephRenderSlot& slot, const RgbEffectStep& step, RenderContext& context);

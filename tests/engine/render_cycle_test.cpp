@@ -55,10 +55,10 @@ TEST(Commands, ToZeroAreCarriedOutOnceThenEnd) {
     rig.command(1, 1, 100, 0);
     rig.pass(9);
     EXPECT_THAT(rig.intensities(), ElementsAre(0));
-    EXPECT_EQ(rig.tables.CommandActive[1], 1);
+    EXPECT_EQ(rig.tables.CommandState[1] & kCommandActive, kCommandActive);
     rig.pass(18);
     EXPECT_THAT(rig.intensities(), IsEmpty());
-    EXPECT_EQ(rig.tables.CommandActive[1], 0);
+    EXPECT_EQ(rig.tables.CommandState[1] & kCommandActive, 0);
     EXPECT_EQ(rig.tables.LevelChanged, 0u) << "an idle level costs nothing";
 }
 
@@ -70,7 +70,7 @@ TEST(Commands, OnALevelSwitchedOffAreStoredAndNotDrawn) {
     rig.command(1, 1, 0, 100);
     rig.pass(9);
     EXPECT_THAT(rig.intensities(), IsEmpty());
-    EXPECT_EQ(rig.tables.CommandActive[1], 1);
+    EXPECT_EQ(rig.tables.CommandState[1] & kCommandActive, kCommandActive);
 }
 
 TEST(Order, IsLevelThenKeyAndGroupsFollowThePlainChannelsOfTheirLevel) {
@@ -137,7 +137,7 @@ TEST(Twinkle, OfAPlainChannelFollowsItsPhases) {
     rig.command(1, 1, 0, 0, 0, 2, 611);
     rig.pass(620);
     rig.pass(629);
-    EXPECT_EQ(rig.tables.Live[1].NextTwinkleTime, 0) << "starts from scratch after its command has ended";
+    EXPECT_EQ(rig.tables.Twinkle[1].NextTwinkleTime, 0) << "starts from scratch after its command has ended";
 }
 
 TEST(Rgb, LevelsRoundAndHoldAndAGroupIsDrawnOnce) {
@@ -290,11 +290,11 @@ TEST(Tick, TextBecomesCommandsAtOnceAndDumpsWhenAFrameIsDrawn) {
     const TickContext tick{clock, parser, rig.host, sink, stream, run, done};
     clock.set(EngineRig::kStart + 5);
     EXPECT_FALSE(ZephRenderTick(kEngineStandard, tick));
-    EXPECT_EQ(rig.tables.CommandActive[1], 1);
+    EXPECT_EQ(rig.tables.CommandState[1] & kCommandActive, kCommandActive);
     EXPECT_EQ(rig.tables.Live[1].Duration, 15);
-    EXPECT_EQ(rig.tables.CommandActive[2], 0);
+    EXPECT_EQ(rig.tables.CommandState[2] & kCommandActive, 0);
     clock.set(EngineRig::kStart + 9);
     EXPECT_TRUE(ZephRenderTick(kEngineStandard, tick));
-    EXPECT_EQ(rig.tables.CommandActive[2], 1);
+    EXPECT_EQ(rig.tables.CommandState[2] & kCommandActive, kCommandActive);
     EXPECT_EQ(rig.tables.Live[2].EndIntensity, 50);
 }
