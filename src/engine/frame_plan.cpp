@@ -1,11 +1,12 @@
 #include "engine/frame_plan.h"
 
 #include "engine/bulb_walk.h"
+#include "engine/item_sort.h"
 #include "engine/paint_order.h"
+#include "engine/pixel_store.h"
 
 #include <algorithm>
 #include <map>
-#include <numeric>
 #include <utility>
 
 namespace {
@@ -145,62 +146,17 @@ private:
     std::map<std::pair<const BulbMask*, std::uint32_t>, std::int32_t> shared_;
 };
 
-// Shares the items out among the bands that they touch; the order within a band is that of painting.
-void sortIntoBands(FramePlan& plan) {
-    const auto forEachBand = [&](const BulbItem& item, auto&& visit) {
-        const BandRange bands = bandsOf(item.Place, plan.Units[static_cast<std::size_t>(item.Unit)].Side, plan.Height);
-        for (std::int32_t band = bands.First; band <= bands.Last; ++band)
-            visit(static_cast<std::size_t>(band));
-    };
-    std::vector<std::int32_t> next(static_cast<std::size_t>(plan.BandCount) + 1, 0);
-    for (const BulbItem& item : plan.Items) {
-        forEachBand(item, [&](std::size_t band) { ++next[band + 1]; });
-    }
-    std::partial_sum(next.begin(), next.end(), next.begin());
-    plan.FirstBandItem = next;
-    plan.BandItems.resize(static_cast<std::size_t>(next.back()));
-    for (const BulbItem& item : plan.Items) {
-        forEachBand(item, [&](std::size_t band) { plan.BandItems[static_cast<std::size_t>(next[band]++)] = item; });
-    }
-}
-
-// An item's key is its tile of columns or the highest key of what it covers, whichever is more. So, sorted by key and
-// else left in order, it follows all that it covers. What covers what is judged by cells, larger than pixels.
-void findLocalOrder(FramePlan& plan) {
-    constexpr std::int32_t kCell = 4;    // pixels
-    constexpr std::int32_t kTile = 128;  // pixels: with the rows of a band 16 KB, half of the cache
-    const std::int32_t columns = plan.Width / kCell + 1;
-    std::vector<std::int32_t> cells;
-    std::vector<std::pair<std::int32_t, BulbItem>> keyed;
-    plan.LocalItems.reserve(plan.BandItems.size());
-    for (std::int32_t band = 0; band < plan.BandCount; ++band) {
-        cells.assign(static_cast<std::size_t>(columns * kBandRows / kCell), 0);
-        keyed.clear();
-        const auto first = plan.BandItems.begin() + plan.FirstBandItem[static_cast<std::size_t>(band)];
-        const auto end = plan.BandItems.begin() + plan.FirstBandItem[static_cast<std::size_t>(band) + 1];
-        for (auto item = first; item != end; ++item) {
-            const std::int32_t side = plan.Units[static_cast<std::size_t>(item->Unit)].Side;
-            const std::int32_t top = band * kBandRows;
-            const std::int32_t left = std::max(0, std::int32_t{item->Place.X});
-            const std::int32_t right = std::min(plan.Width, item->Place.X + side) - 1;
-            const std::int32_t upper = std::max(0, item->Place.Y - top) / kCell;
-            const std::int32_t lower = (std::min(kBandRows, item->Place.Y + side - top) - 1) / kCell;
-            std::int32_t key = left / kTile;
-            const auto forCells = [&](auto&& visit) {
-                for (std::int32_t y = upper; y <= lower; ++y) {
-                    for (std::int32_t x = left / kCell; x <= right / kCell; ++x) {
-                        visit(cells[static_cast<std::size_t>(y * columns + x)]);
-                    }
-                }
-            };
-            forCells([&](std::int32_t cell) { key = std::max(key, cell); });
-            forCells([&](std::int32_t& cell) { cell = key; });
-            keyed.emplace_back(key, *item);
-        }
-        std::ranges::stable_sort(keyed, {}, [](const auto& entry) { return entry.first; });
-        for (const auto& entry : keyed)
-            plan.LocalItems.push_back(entry.second);
-    }
+void cutIntoTiles(FramePlan& plan) {
+    constexpr std::int32_t kLeastSides = 8;  // of the largest image, to a tile
+    const std::int32_t wanted = std::max(kLeastTileWidth, kLeastSides * plan.MaxSide);
+    plan.TileWidth = wholeCacheLines(std::min(wanted, plan.Width));
+    plan.TileColumns = (plan.Width + plan.TileWidth - 1) / plan.TileWidth;
+    plan.FirstTileItem.assign(static_cast<std::size_t>(plan.BandCount * plan.TileColumns) + 1, 0);
+    sortItems([&](auto&& visit) { std::for_each(plan.Items.begin(), plan.Items.end(), visit); },
+              [&](const BulbItem& item, auto&& visit) {
+                  forEachTile(item.Place, plan.Units[static_cast<std::size_t>(item.Unit)].Side, plan, visit);
+              },
+              plan.TileItems, plan.FirstTileItem);
 }
 
 }  // namespace
@@ -218,7 +174,6 @@ FramePlan makeFramePlan(const ZephSimulation& document, const ZephRenderTables& 
     plan.BandCount = (height + kBandRows - 1) / kBandRows;
     plan.BandColumns.assign(static_cast<std::size_t>(plan.BandCount), {width, 0});
     PlanBuilder(document, tables, states, masks, bulbs, plan).addAll();
-    sortIntoBands(plan);
-    findLocalOrder(plan);
+    cutIntoTiles(plan);
     return plan;
 }

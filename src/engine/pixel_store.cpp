@@ -15,8 +15,8 @@ constexpr std::size_t kHugePage = std::size_t{2} << 20;  // bytes
 
 }  // namespace
 
-void PixelStore::resize(std::int32_t width, std::int32_t height) {
-    stride_ = kMarginPixels + wholeCacheLines(width) + wholeCacheLines(kMarginPixels + kBlendOverreach);
+void PixelStore::resize(std::int32_t width, std::int32_t height, std::int32_t margin) {
+    stride_ = margin + wholeCacheLines(width) + wholeCacheLines(margin + kBlendOverreach);
     const std::size_t pixels = static_cast<std::size_t>(stride_) * static_cast<std::size_t>(height);
     const std::size_t bytes = (pixels * sizeof(std::uint32_t) + kHugePage - 1) / kHugePage * kHugePage;
     pixels_.reset(static_cast<std::uint32_t*>(std::aligned_alloc(kHugePage, bytes)));
@@ -26,7 +26,7 @@ void PixelStore::resize(std::int32_t width, std::int32_t height) {
     static_cast<void>(madvise(pixels_.get(), bytes, MADV_HUGEPAGE));
 #endif
     std::fill_n(pixels_.get(), pixels, 0xFF000000U);
-    first_ = pixels_.get() + kMarginPixels;
+    first_ = pixels_.get() + margin;
 }
 
 void PixelStore::load(const QImage& picture) {

@@ -20,8 +20,9 @@ constexpr std::int32_t wholeCacheLines(std::int32_t pixels) noexcept {
 
 class PixelStore {
 public:
-    // Opaque black, margins included. On failure an exception, as of any container.
-    void resize(std::int32_t width, std::int32_t height);
+    // Opaque black, margins included. margin: pixels on either side, whole cache lines; kernels may overreach it on the
+    // right. On failure an exception, as of any container.
+    void resize(std::int32_t width, std::int32_t height, std::int32_t margin = kMarginPixels);
     // Opaque, from a picture of the size that the store was given.
     void load(const QImage& picture);
 

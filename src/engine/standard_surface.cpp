@@ -33,7 +33,7 @@ bool StandardSurface::prepare(const SurfaceScene& scene, FailureReport& failures
     pool_.reserve(plan_.Groups, plan_.FloodGroups, plan_.MaxFloodSize);
     frame_.resize(width, height);
     background_.resize(width, height);
-    band_.resize(width, kBandRows + 2 * kBandMarginRows);
+    tile_.resize(plan_.TileWidth, kBandRows + 2 * kBandMarginRows, wholeCacheLines(plan_.MaxSide));
     image_ = QImage(reinterpret_cast<uchar*>(frame_.row(0)), width, height,
                     frame_.stride() * static_cast<qsizetype>(sizeof(std::uint32_t)), QImage::Format_RGB32);
 
@@ -46,10 +46,13 @@ bool StandardSurface::prepare(const SurfaceScene& scene, FailureReport& failures
     notedWhole_.reserve(plan_.Units.size());
     lastNotedWhole_.reserve(plan_.Units.size());
     listed_.reserve(listed);
-    for (BandLists* lists : {&bandListed_, &lastListed_}) {
-        lists->Items.assign(plan_.BandItems.size() + listed_.capacity() * bandsOfBulb, {});
+    for (PartLists* lists : {&bandListed_, &lastListed_}) {
+        lists->Items.assign(plan_.TileItems.size() + listed_.capacity() * bandsOfBulb, {});
         lists->First.assign(bands + 1, 0);
     }
+    constexpr std::size_t kTileColumnsOfBulb = 2;  // no image is as wide as a tile
+    tileListed_.Items.assign(listed_.capacity() * bandsOfBulb * kTileColumnsOfBulb, {});
+    tileListed_.First.assign(plan_.FirstTileItem.size(), 0);
     alone_.assign(lastListed_.Items.size(), 0);
     covered_.assign(static_cast<std::size_t>(kBandRows * coveredWords(plan_.Width)), 0);
     for (SavedPixels* saved : {&saved_, &lastSaved_}) {
@@ -75,8 +78,9 @@ void StandardSurface::release() {
     image_ = {};
     frame_ = {};
     background_ = {};
-    band_ = {};
+    tile_ = {};
     bandListed_ = {};
+    tileListed_ = {};
     lastListed_ = {};
     lastNotedWhole_.clear();
     alone_.clear();

@@ -1,5 +1,5 @@
 // The standard drawing surface: lights as ready images, blended over the background picture on a 32-bit frame. The
-// calls of a frame are noted and painted at its end: densely lit displays band by band, thinly lit ones bulb by bulb.
+// calls of a frame are noted and painted at its end: densely lit displays tile by tile, thinly lit ones bulb by bulb.
 // One thread; a frame allocates nothing.
 #pragma once
 
@@ -71,14 +71,25 @@ private:
         Listed,  // shows the squares of lastListed_
         Unknown  // shows other lights
     };
-    // Bulbs by band, within a band in the order of painting.
-    struct BandLists {
+    // Bulbs by band, or by tile, within it in the order of painting.
+    struct PartLists {
         std::vector<BulbItem> Items;
-        std::vector<std::int32_t> First;  // [band], one more than bands
+        std::vector<std::int32_t> First;  // [part], one more than parts
 
-        std::span<const BulbItem> of(std::size_t band) const noexcept {
-            return {Items.data() + First[band], static_cast<std::size_t>(First[band + 1] - First[band])};
+        std::span<const BulbItem> of(std::size_t part) const noexcept { return of(part, part + 1); }
+        std::span<const BulbItem> of(std::size_t part, std::size_t end) const noexcept {
+            return itemsOf(Items, First, part, end);
         }
+    };
+    static std::span<const BulbItem> itemsOf(const std::vector<BulbItem>& items, const std::vector<std::int32_t>& first,
+                                             std::size_t part, std::size_t end) noexcept {
+        return {items.data() + first[part], static_cast<std::size_t>(first[end] - first[part])};
+    }
+    // The pixels of a tile that lights can reach, whole cache lines; Left = Right: none.
+    struct TileArea {
+        RowRange Rows;
+        std::int32_t Left = 0;
+        std::int32_t Right = 0;
     };
 
     // What lay under the bulbs of a thinly lit frame, one after the other in the order of painting.
@@ -105,7 +116,9 @@ private:
     void forEachNoted(Visit visit) const;
     void paintDense();
     bool denseBandChanged(std::size_t band) const noexcept;
-    void paintBandDense(std::size_t band);
+    TileArea tileArea(std::size_t tile) const noexcept;
+    void paintTileDense(std::size_t tile);
+    void paintItemsDense(std::size_t tile, RowRange rows, const PixelTarget& target);
     void paintThin();
     void paintBandThin(std::size_t band);
     bool showsLastList() const noexcept;
@@ -119,8 +132,7 @@ private:
     void keepSaved(std::size_t band);
     Square squareOf(const BulbItem& item, RowRange rows) const noexcept;
     void fetchItem(const BulbItem& item) const noexcept;
-    void fetchRow(std::size_t band, std::int32_t y) const noexcept;
-    std::span<const BulbItem> plannedOf(std::size_t band) const noexcept;
+    void fetchTileRow(const TileArea& area, std::int32_t row0) const noexcept;
     RowRange bandRows(std::size_t band) const noexcept;
     std::uint64_t tilesOf(const BulbItem& item) const noexcept;
     void tellBand(std::size_t band);
@@ -135,7 +147,7 @@ private:
 
     PixelStore frame_;
     PixelStore background_;
-    PixelStore band_;  // one band under way, with kBandMarginRows above and below
+    PixelStore tile_;  // one tile under way, with kBandMarginRows above and below and the largest image on either side
     QImage image_;
 
     // The frame under way. A later pass comes about only when calls leave the planned order or lists overflow.
@@ -149,14 +161,15 @@ private:
     std::int64_t litBulbs_ = 0;
     std::int64_t litPixels_ = 0;
     std::int32_t passes_ = 0;
-    BandLists bandListed_;
+    PartLists bandListed_;  // of a thinly lit frame
+    PartLists tileListed_;  // of a densely lit one
     SavedPixels saved_;
     std::vector<QRect> changed_;
 
     // What the frame before left on the picture.
     std::vector<std::uint8_t> lastAlpha_;
     std::vector<std::uint8_t> lastWhole_;
-    BandLists lastListed_;
+    PartLists lastListed_;
     SavedPixels lastSaved_;
     std::vector<BandLight> bandLight_;
     std::vector<std::int32_t> lastNotedWhole_;

@@ -1,6 +1,7 @@
-// How the standard surface paints what was noted. A densely lit frame: each band of rows is put together in the cache,
-// from the background up, and streamed out. A thinly lit one: its bulbs are sorted by bands, and in each band those of
+// How the standard surface paints what was noted. A densely lit frame: each tile is put together in the cache, from
+// the background up, and streamed out. A thinly lit one: its bulbs are sorted by bands, and in each band those of
 // the frame before are taken away and the new ones blended where they lie.
+#include "engine/item_sort.h"
 #include "engine/standard_surface.h"
 
 #include <algorithm>
@@ -35,30 +36,6 @@ void copySquare(const std::uint32_t* from, std::ptrdiff_t fromStride, std::uint3
     for (std::int32_t y = square.Top; y < square.Bottom; ++y, from += fromStride, to += toStride) {
         copyFours(from, to, square.Width);
     }
-}
-
-// A counting sort: forEach visits the items in the order of painting, twice, and that order stays within a band.
-template <typename ForEach>
-void sortIntoBands(const FramePlan& plan, ForEach forEach, std::vector<BulbItem>& sorted,
-                   std::vector<std::int32_t>& first) {
-    const auto forBands = [&](const BulbItem& item, auto&& visit) {
-        const BandRange bands = bandsOf(item.Place, sideOf(item, plan), plan.Height);
-        for (std::int32_t band = bands.First; band <= bands.Last; ++band)
-            visit(static_cast<std::size_t>(band));
-    };
-    std::fill(first.begin(), first.end(), 0);
-    // Counted one place on, so that after the second round each band's number is where its items begin.
-    const std::size_t bands = first.size() - 1;
-    forEach([&](const BulbItem& item) {
-        forBands(item, [&](std::size_t band) {
-            if (band + 2 <= bands) ++first[band + 2];
-        });
-    });
-    for (std::size_t band = 2; band <= bands; ++band)
-        first[band] += first[band - 1];
-    forEach([&](const BulbItem& item) {
-        forBands(item, [&](std::size_t band) { sorted[static_cast<std::size_t>(first[band + 1]++)] = item; });
-    });
 }
 
 }  // namespace
@@ -147,60 +124,74 @@ void StandardSurface::forEachNoted(Visit visit) const {
 }
 
 void StandardSurface::paintDense() {
-    const auto forEachListed = [&](auto&& visit) { std::for_each(listed_.begin(), listed_.end(), visit); };
-    sortIntoBands(plan_, forEachListed, bandListed_.Items, bandListed_.First);
+    sortItems([&](auto&& visit) { std::for_each(listed_.begin(), listed_.end(), visit); },
+              [&](const BulbItem& item, auto&& visit) { forEachTile(item.Place, sideOf(item, plan_), plan_, visit); },
+              tileListed_.Items, tileListed_.First);
+    const auto columns = static_cast<std::size_t>(plan_.TileColumns);
     for (std::size_t band = 0; band < bandLight_.size(); ++band) {
         if (!denseBandChanged(band)) continue;
-        paintBandDense(band);
-        bandLight_[band] = bandListed_.of(band).empty() ? BandLight::Whole : BandLight::Unknown;
+        for (std::size_t tile = band * columns; tile < (band + 1) * columns; ++tile)
+            paintTileDense(tile);
+        const bool listed = !tileListed_.of(band * columns, (band + 1) * columns).empty();
+        bandLight_[band] = listed ? BandLight::Unknown : BandLight::Whole;
         tellBand(band);
     }
     kernels_.endStreaming();
 }
 
 bool StandardSurface::denseBandChanged(std::size_t band) const noexcept {
+    const std::size_t first = band * static_cast<std::size_t>(plan_.TileColumns);
+    const std::size_t end = first + static_cast<std::size_t>(plan_.TileColumns);
     if (bandLight_[band] == BandLight::Listed || bandLight_[band] == BandLight::Unknown ||
-        !bandListed_.of(band).empty()) {
+        !tileListed_.of(first, end).empty()) {
         return true;
     }
-    const std::span<const BulbItem> items = plannedOf(band);
-    return std::any_of(items.begin(), items.end(), [&](const BulbItem& item) {
+    return std::ranges::any_of(itemsOf(plan_.TileItems, plan_.FirstTileItem, first, end), [&](const BulbItem& item) {
         const auto unit = static_cast<std::size_t>(item.Unit);
         return whole_[unit] != lastWhole_[unit] || (spriteChanged_[unit] != 0 && whole_[unit] != 0);
     });
 }
 
-std::span<const BulbItem> StandardSurface::plannedOf(std::size_t band) const noexcept {
-    // Listed bulbs are merged by the order of units, which only BandItems keep.
-    const std::vector<BulbItem>& items = bandListed_.of(band).empty() ? plan_.LocalItems : plan_.BandItems;
-    const std::int32_t first = plan_.FirstBandItem[band];
-    return {items.data() + first, static_cast<std::size_t>(plan_.FirstBandItem[band + 1] - first)};
+StandardSurface::TileArea StandardSurface::tileArea(std::size_t tile) const noexcept {
+    const auto columns = static_cast<std::size_t>(plan_.TileColumns);
+    const ColumnRange reached = plan_.BandColumns[tile / columns];
+    const std::int32_t left = static_cast<std::int32_t>(tile % columns) * plan_.TileWidth;
+    TileArea area{bandRows(tile / columns), std::max(left, reached.Left / kCacheLinePixels * kCacheLinePixels),
+                  std::min(left + plan_.TileWidth, wholeCacheLines(reached.Right))};
+    area.Right = std::max(area.Left, area.Right);
+    return area;
 }
 
-// Puts the band together in the cache, planned and listed bulbs merged by the order of their units, and streams it out.
-void StandardSurface::paintBandDense(std::size_t band) {
-    const RowRange rows = bandRows(band);
-    const ColumnRange columns = plan_.BandColumns[band];
-    const std::int32_t left = columns.Left / kCacheLinePixels * kCacheLinePixels;
-    const std::int32_t pixels = wholeCacheLines(columns.Right - left);
-    std::uint32_t* origin = band_.row(kBandMarginRows) - std::ptrdiff_t{rows.Top} * band_.stride();
-    const PixelTarget target{origin, band_.stride()};
-    for (std::int32_t y = rows.Top; y < rows.Bottom; ++y) {
-        copyPixels(background_.row(y) + left, origin + y * target.Stride + left, pixels);
+// Puts the tile together in the cache and streams it out.
+void StandardSurface::paintTileDense(std::size_t tile) {
+    const TileArea area = tileArea(tile);
+    if (area.Left == area.Right) return;
+    const std::int32_t pixels = area.Right - area.Left;
+    const PixelTarget target{tile_.row(kBandMarginRows) - std::ptrdiff_t{area.Rows.Top} * tile_.stride() - area.Left,
+                             tile_.stride()};
+    for (std::int32_t y = area.Rows.Top; y < area.Rows.Bottom; ++y) {
+        copyPixels(background_.row(y) + area.Left, target.Origin + y * target.Stride + area.Left, pixels);
     }
+    paintItemsDense(tile, {area.Rows.Top - kBandMarginRows, area.Rows.Bottom + kBandMarginRows}, target);
+    for (std::int32_t y = area.Rows.Top; y < area.Rows.Bottom; ++y) {
+        kernels_.streamRow(target.Origin + y * target.Stride + area.Left, frame_.row(y) + area.Left, pixels);
+    }
+}
 
-    const RowRange painted{rows.Top - kBandMarginRows, rows.Bottom + kBandMarginRows};
-    const std::span<const BulbItem> items = plannedOf(band);
-    const std::span<const BulbItem> listed = bandListed_.of(band);
+// Planned and listed bulbs merged by the order of their units.
+void StandardSurface::paintItemsDense(std::size_t tile, RowRange rows, const PixelTarget& target) {
+    const std::span<const BulbItem> items = itemsOf(plan_.TileItems, plan_.FirstTileItem, tile, tile + 1);
+    const std::span<const BulbItem> listed = tileListed_.of(tile);
     std::size_t item = 0;
     std::size_t list = 0;
     const auto paintItemsUpTo = [&](std::size_t end) {
-        kernels_.blendItems(items.subspan(item, end - item), whole_.data(), plan_.Sprites.data(), painted, target);
+        kernels_.blendItems(items.subspan(item, end - item), whole_.data(), plan_.Sprites.data(), rows, target);
         item = end;
     };
-    // The next band's background is fetched row by row meanwhile: blending leaves the memory idle.
+    // The next tile's background is fetched row by row meanwhile: blending leaves the memory idle.
+    const TileArea next = tile + 2 < plan_.FirstTileItem.size() ? tileArea(tile + 1) : TileArea{};
     for (std::int32_t part = 1; part <= kBandRows; ++part) {
-        if (band + 1 < bandLight_.size()) fetchRow(band + 1, rows.Bottom + part - 1);
+        fetchTileRow(next, part - 1);
         const std::size_t end = items.size() * static_cast<std::size_t>(part) / kBandRows;
         while (list < listed.size() && end > 0 && listed[list].Unit < items[end - 1].Unit) {
             const std::int32_t unit = listed[list].Unit;
@@ -211,29 +202,30 @@ void StandardSurface::paintBandDense(std::size_t band) {
             const std::size_t first = list;
             while (list < listed.size() && listed[list].Unit < before)
                 ++list;
-            kernels_.blendItems(listed.subspan(first, list - first), alpha_.data(), plan_.Sprites.data(), painted,
-                                target);
+            kernels_.blendItems(listed.subspan(first, list - first), alpha_.data(), plan_.Sprites.data(), rows, target);
         }
         if (item < end) paintItemsUpTo(end);
     }
-    kernels_.blendItems(listed.subspan(list), alpha_.data(), plan_.Sprites.data(), painted, target);
-
-    for (std::int32_t y = rows.Top; y < rows.Bottom; ++y) {
-        kernels_.streamRow(origin + y * target.Stride + left, frame_.row(y) + left, pixels);
-    }
+    kernels_.blendItems(listed.subspan(list), alpha_.data(), plan_.Sprites.data(), rows, target);
 }
 
-void StandardSurface::fetchRow(std::size_t band, std::int32_t y) const noexcept {
-    if (y >= plan_.Height) return;
+void StandardSurface::fetchTileRow(const TileArea& area, std::int32_t row0) const noexcept {
+    const std::int32_t y = area.Rows.Top + row0;
+    if (y >= area.Rows.Bottom) return;
     const std::uint32_t* row = background_.row(y);
-    for (std::int32_t x = plan_.BandColumns[band].Left; x < plan_.BandColumns[band].Right; x += kCacheLinePixels) {
+    for (std::int32_t x = area.Left; x < area.Right; x += kCacheLinePixels) {
         __builtin_prefetch(row + x, 0, 2);
     }
 }
 
 void StandardSurface::paintThin() {
-    sortIntoBands(
-        plan_, [&](auto&& visit) { forEachNoted(visit); }, bandListed_.Items, bandListed_.First);
+    sortItems([&](auto&& visit) { forEachNoted(visit); },
+              [&](const BulbItem& item, auto&& visit) {
+                  const BandRange bands = bandsOf(item.Place, sideOf(item, plan_), plan_.Height);
+                  for (std::int32_t band = bands.First; band <= bands.Last; ++band)
+                      visit(static_cast<std::size_t>(band));
+              },
+              bandListed_.Items, bandListed_.First);
     saved_.Used = 0;
     for (std::size_t band = 0; band < bandLight_.size(); ++band)
         paintBandThin(band);

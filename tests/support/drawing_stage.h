@@ -99,7 +99,7 @@ public:
     // everyShape: every size, shape and fixture type, odd ones too; otherwise squares that are no floods, of which
     // every way of drawing covers the same pixels.
     explicit RandomStage(std::uint64_t seed, bool everyShape = true) : everyShape_(everyShape), random_(seed) {
-        background = noisyPicture(pick(1, 3) == 1 ? 97 : 260, pick(20, 170), random_);
+        background = noisyPicture(pick(1, 3) == 1 ? 97 : 420, pick(20, 170), random_);
         for (int n = pick(1, 25); n > 0; --n)
             addRandomFixture();
         finish();
