@@ -28,6 +28,9 @@ public:
         goals.push_back({std::move(name), std::move(figure), std::move(goalText), met});
     }
 
+    // To standard output: a table of the rows, unless goalsOnly, and one line a goal.
+    void print(bool goalsOnly) const;
+
     std::vector<Row> rows;
     std::vector<Goal> goals;
 };

@@ -9,28 +9,6 @@
 
 namespace {
 
-void printRows(const BenchReport& report) {
-    std::string group;
-    double first = 0;
-    for (const BenchReport::Row& row : report.rows) {
-        if (row.group != group) {
-            group = row.group;
-            first = row.microseconds;
-            std::printf("\n%s\n", group.c_str());
-        }
-        const double ratio = first > 0 ? row.microseconds / first : 0;
-        std::printf("  %-58s %12.1f us %8.2f x\n", row.name.c_str(), row.microseconds, ratio);
-    }
-    std::printf("\n");
-}
-
-void printGoals(const BenchReport& report) {
-    for (const BenchReport::Goal& goal : report.goals) {
-        std::printf("goal %s: %s (%s) %s\n", goal.name.c_str(), goal.figure.c_str(), goal.goal.c_str(),
-                    goal.met ? "met" : "short");
-    }
-}
-
 struct Subject {
     std::string_view name;
     void (*measure)(BenchReport& report);
@@ -63,7 +41,6 @@ int main(int count, char** arguments) {
     for (const Subject& subject : kSubjects) {
         if (chosen.empty() || std::ranges::find(chosen, subject.name) != chosen.end()) subject.measure(report);
     }
-    if (!goalsOnly) printRows(report);
-    printGoals(report);
+    report.print(goalsOnly);
     return 0;
 }
