@@ -1,22 +1,21 @@
-// The file dialogs of the window.
+// Which file to read or to write: where the dialogs start, the extension, and the question before a file is replaced.
 #pragma once
 
 #include "editor/file_dialogs.h"
 #include "shell/program.h"
-
-class QWidget;
+#include "shell/window_host.h"
 
 class WindowFileDialogs : public FileDialogs {
 public:
-    WindowFileDialogs(QWidget& owner, const Program& program) : owner_(owner), program_(program) {}
+    WindowFileDialogs(const Program& program, WindowHost& host) : program_(program), host_(host) {}
 
     bool chooseInput(const FileDialog& dialog, std::string& fullPath) override;
     bool chooseOutput(const FileDialog& dialog, std::string& fullPath) override;
 
 private:
     QString startFolder(const FileDialog& dialog) const;
-    QString ask(const FileDialog& dialog, const QString& start, bool save);
+    bool mayReplace(const FileDialog& dialog, const QString& path);
 
-    QWidget& owner_;
     const Program& program_;
+    WindowHost& host_;
 };

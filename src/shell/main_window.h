@@ -130,7 +130,7 @@ private:
     Program& program_;
     WindowHost& host_;
     ProgramModes modes_{program_, *this};
-    WindowFileDialogs dialogs_{*this, program_};
+    WindowFileDialogs dialogs_{program_, host_};
     WindowKeys keys_;
     CommandStates states_;
     EditToolBarTexts texts_;
@@ -143,7 +143,7 @@ private:
     StatusRow* StatusBar1_ = nullptr;
     QTimer hrTimer1_;
     QTimer tmrAdjustBrightness_;
-    QTimer tmrAutoSave_;
+    QTimer tmrAutoSave_{this};
     int lastIntensity_ = 500;  // of sldIntensity at the timer's last tick; the first tick always sees a move
 
     bool movingList_ = false;      // the re-entry flag of the keyboard: Tab is moving the list
