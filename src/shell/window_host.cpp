@@ -74,6 +74,8 @@ BoxAnswer WindowHost::messageBox(std::string_view title, std::string_view text, 
     QMessageBox box(boxIcon(icon), toQString(title), toQString(text).replace("\r\n", "\n"), boxButtons(buttons),
                     owner());
     box.setTextFormat(Qt::PlainText);
+    // A hasty Enter must not lose what a warning is about.
+    if (icon == BoxIcon::Warning) box.setDefaultButton(QMessageBox::No);
     const BoxAnswer answer = box.exec() == 0 && buttons == BoxButtons::Ok
                                  ? BoxAnswer::Ok
                                  : boxAnswer(box.standardButton(box.clickedButton()));

@@ -134,10 +134,10 @@ TEST_F(WindowDocuments, SavesItselfWhereTheStateAllowsIt) {
     auto* timer = window.findChild<QTimer*>("tmrAutoSave");
     ASSERT_EQ(timer->interval(), 600);
     rig.program.settings.AutoSave = 1;
-    rig.program.autosave.Tag = 59;
-    timer->setInterval(1);
     press(Qt::Key_F2, Qt::NoModifier);
     change("By itself");
+    rig.program.autosave.Tag = 59;
+    timer->setInterval(1);
     QTest::qWait(50);
     EXPECT_TRUE(document().SimulationDirty) << "not while props are selected";
     press(Qt::Key_F3, Qt::NoModifier);
