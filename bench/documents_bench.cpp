@@ -27,7 +27,7 @@ std::string millisecondsText(double microseconds) {
 class NoFace : public UndoFace {
 public:
     void switchMode(int) override {}
-    void documentReplaced() override {}
+    void documentReplaced(bool) override {}
 };
 
 // A display with what procedures need around it.

@@ -111,7 +111,7 @@ void CheckEnable(bool forceEnable, const CommandInputs& inputs, CommandStates& s
     enable(kSelectionCommands, false, states);
     if (open && objectSelected(editor)) enableSelectionCommands(inputs, states);
     const bool editing = open && editor.ZephUIState != kStateSimulation;
-    states[PasteObject].enabled = open && inputs.ClipboardCount >= 1;
+    states[PasteObject].enabled = open && !editor.ZephClipboard.empty();
     states[Undo].enabled = editing && inputs.undo.UndoCount >= 1;
     states[Redo].enabled = editing && inputs.undo.RedoCount >= 1;
 

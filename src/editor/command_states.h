@@ -11,7 +11,6 @@
 struct CommandInputs {
     const ZephSimulation& simulation;
     const ZephEditorState& editor;
-    std::int32_t ClipboardCount = 0;  // entries of the clipboard array
     UndoSummary undo;
     std::int32_t NameLocation = 0;  // row of the fixture text location table, 0 = no names
     bool RunningInDevelopment = false;

@@ -5,6 +5,8 @@
 #include "model/simulation.h"
 #include "model/ui_state.h"
 
+#include <vector>
+
 // The mode that is asked for to get into kStateDrawing; the other modes are asked for by the number of their state.
 inline constexpr int kModeDrawing = 5;
 
@@ -57,9 +59,10 @@ struct ZephEditorState {
     bool ZephIgnoreLocks = false;  // locked fixtures can be edited: the selection was made in the list
     bool SimplePropMode = true;    // chkSimplePropMode: a prop counts as one object
     ZephAnchor ZephInProgressAnchor;
-    ZephFixture ZephInProgressFixture;     // collects the points of a stroke
-    std::int32_t ZephInProgressIndex = 0;  // fixture that a stroke has reserved, 0 = none
-    std::int32_t ZephAppendTarget = 0;     // fixture that further bulbs are added to, 0 = none
+    ZephFixture ZephInProgressFixture;       // collects the points of a stroke
+    std::int32_t ZephInProgressIndex = 0;    // fixture that a stroke has reserved, 0 = none
+    std::int32_t ZephAppendTarget = 0;       // fixture that further bulbs are added to, 0 = none
+    std::vector<ZephFixture> ZephClipboard;  // whole copies: one fixture, or those of a prop in its order
 
     bool operator==(const ZephEditorState&) const = default;
 };

@@ -1,12 +1,12 @@
-// Keeps the editor's state in step with a document that is emptied or loses a fixture.
+// Keeps the editor's state and the undo stores in step with a document that is emptied or loses a fixture.
 #pragma once
 
 #include "editor/editor_state.h"
-#include "model/document.h"
+#include "model/undo.h"
 
 class EditorStateWatcher : public DocumentWatcher {
 public:
-    explicit EditorStateWatcher(ZephEditorState& editor) : editor_(editor) {}
+    EditorStateWatcher(ZephEditorState& editor, ZephUndoStores& stores) : editor_(editor), stores_(stores) {}
 
     void selectionCleared() override { editor_.ZephSelection = {}; }
     void fixtureRemoved(int fixture) override {
@@ -21,8 +21,13 @@ public:
         editor_.ZephInProgressAnchor = {};
         editor_.ZephAppendTarget = 0;
     }
-    void clipboardAndStatusCleared() override {}
+    // RedoPosition stays: until the next change, redo brings the old document back.
+    void clipboardAndStatusCleared() override {
+        editor_.ZephClipboard.clear();
+        stores_.UndoPosition = 0;
+    }
 
 private:
     ZephEditorState& editor_;
+    ZephUndoStores& stores_;
 };

@@ -18,7 +18,7 @@ KeyAnswer whileDrawing(const KeyDown& down, const ZephEditorState& editor) {
 KeyAnswer onClipboard(const KeyDown& down, const CommandInputs& inputs) {
     const bool selected = objectSelected(inputs.editor);
     if (down.key == kKeyC && selected) return run(Command::CopyObject);
-    if (down.key == kKeyV && inputs.ClipboardCount > 0) return run(Command::PasteObject);
+    if (down.key == kKeyV && !inputs.editor.ZephClipboard.empty()) return run(Command::PasteObject);
     if (down.key == kKeyX && selected) return run(Command::Cut);
     return {};
 }

@@ -1,5 +1,6 @@
 #include "editor/mode_commands.h"
 
+#include "editor/limits.h"
 #include "editor/tool_bar_texts.h"
 
 namespace {
@@ -26,24 +27,6 @@ void changeTo(int state, const ModeContext& context) {
     context.face.CheckEnable(false);
 }
 
-void tellLimit(const char* what, int most, Host& host) {
-    host.messageBox(boxTitle("-Error"),
-                    "You have created the maximum number (" + std::to_string(most) + ") of " + what + ".",
-                    BoxIcon::Critical);
-}
-
-bool propFits(const ModeContext& context) {
-    if (context.simulation.FixtureCount >= kMaxFixtures) {
-        tellLimit("fixtures", kMaxFixtures, context.host);
-        return false;
-    }
-    if (context.simulation.PropCount >= kMaxProps) {
-        tellLimit("props", kMaxProps, context.host);
-        return false;
-    }
-    return true;
-}
-
 }  // namespace
 
 void mnuSelect_Click(const ModeContext& context) try {
@@ -67,7 +50,10 @@ void drawTool_Click(int tool, const ModeContext& context) try {
     // The only tool with this guard: choosing light strings again goes on with the stroke, choosing another tool again
     // forgets the fixture that bulbs were being added to.
     if (tool == kToolLightStrings && editor.ZephUIState == kStateDrawing && editor.ZephDrawTool == tool) return;
-    if (tool >= kToolArchWizard && !propFits(context)) return;
+    if (tool >= kToolArchWizard &&
+        !(fixtureFits(context.simulation, context.host) && propFits(context.simulation, context.host))) {
+        return;
+    }
     if (objectSelected(editor)) deselect(context);
     editor.ZephIgnoreLocks = false;
     editor.ZephAppendTarget = 0;

@@ -1,5 +1,6 @@
 #include "editor/object_list.h"
 
+#include "editor/selection.h"
 #include "editor/tool_bar_texts.h"
 #include "model/document.h"
 #include "util/text.h"
@@ -46,8 +47,7 @@ void flgObjectSelect_Click(std::int32_t object, const ModeContext& context) try 
     context.face.ZephDeselectflg();
     // The list is the way to reach an object that is locked, so it can be edited until the canvas selects another.
     editor.ZephIgnoreLocks = true;
-    editor.ZephSelection.Object = object;
-    context.face.ZephHighlightflg(object);
+    ZephFoundObject(object, context);
     context.face.redrawObjects();
     context.host.setStatusPanel(2, ZephUpdateStatusBarForUIState(context.simulation, editor, false));
     context.face.CheckEnable(false);

@@ -23,21 +23,15 @@ std::string fixtureText(const ZephSimulation& simulation, const ZephEditorState&
 
 }  // namespace
 
-void SetEditToolBarTips(const ZephSimulation& simulation, const ZephEditorState& editor, const UndoSummary& undo,
-                        std::string_view undoText, std::string_view redoText, EditToolBarTexts& texts) {
+void SetEditToolBarTips(const ZephSimulation& simulation, const ZephEditorState& editor, const ZephUndoStores& stores,
+                        EditToolBarTexts& texts) {
     const bool fixtureSelected = editor.ZephUIState == kStateSelectFixture && objectSelected(editor);
     const std::int32_t level = fixtureOrEmpty(simulation, editor.ZephSelection.Object).ZOrder;
     texts.MoveForwardTip =
         fixtureSelected && level < kLevels ? levelTip("Move Forward", level + 1) : std::string("Move Forward");
     texts.MoveBackwardTip =
         fixtureSelected && level > 1 ? levelTip("Move Backward", level - 1) : std::string("Move Backward");
-
-    const bool undoable = undo.UndoCount >= 1;
-    const bool redoable = undo.RedoCount >= 1;
-    texts.UndoTip = undoable ? "Undo: " + std::string(undoText) : std::string("Undo");
-    texts.RedoTip = redoable ? "Redo: " + std::string(redoText) : std::string("Redo");
-    texts.UndoCaption = undoable ? "Undo " + std::string(undoText) : std::string("Undo");
-    texts.RedoCaption = redoable ? "Redo " + std::string(redoText) : std::string("Redo");
+    texts.Undo = ZephUndoCaptions(stores);
     if (editor.ZephUIState == kStateSelectFixture) texts.ObjectProperties = "Fixture Properties";
     if (editor.ZephUIState == kStateSelectProp) texts.ObjectProperties = "Prop Properties";
 }

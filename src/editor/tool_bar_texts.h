@@ -3,8 +3,7 @@
 #pragma once
 
 #include "editor/editor_state.h"
-#include "model/settings.h"
-#include "model/simulation.h"
+#include "model/undo.h"
 
 #include <string>
 #include <string_view>
@@ -12,19 +11,13 @@
 struct EditToolBarTexts {
     std::string MoveForwardTip = "Move Forward";
     std::string MoveBackwardTip = "Move Backward";
-    std::string UndoTip = "Undo";
-    std::string RedoTip = "Redo";
-    std::string UndoCaption = "Undo";  // of mnuUndo and popUndo
-    std::string RedoCaption = "Redo";
+    UndoCaptions Undo;
     std::string ObjectProperties = "Fixture Properties";  // caption and tip
-
-    bool operator==(const EditToolBarTexts&) const = default;
 };
 
-// undoText, redoText: descriptions of the top entries, not looked at where the store is empty. In states that select
-// nothing the name of ObjectProperties stays.
-void SetEditToolBarTips(const ZephSimulation& simulation, const ZephEditorState& editor, const UndoSummary& undo,
-                        std::string_view undoText, std::string_view redoText, EditToolBarTexts& texts);
+// In states that select nothing the name of ObjectProperties stays.
+void SetEditToolBarTips(const ZephSimulation& simulation, const ZephEditorState& editor, const ZephUndoStores& stores,
+                        EditToolBarTexts& texts);
 
 // Text of status panel 2. suppressSelected: the state alone, as if nothing were selected; told apart in Select Fixture.
 std::string ZephUpdateStatusBarForUIState(const ZephSimulation& simulation, const ZephEditorState& editor,

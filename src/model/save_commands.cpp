@@ -25,15 +25,16 @@ std::optional<std::string> freeBackupName(const std::string& fullPath) {
     return std::nullopt;
 }
 
-void saveAndTell(const SaveContext& context, ZephSimulation& simulation, AutoSaveState& autosave) {
+bool saveAndTell(const SaveContext& context, ZephSimulation& simulation, AutoSaveState& autosave) {
     context.face.addRecentFile(simulation.FilePath + simulation.FileName);
     // A refusal of the disk was told; the commands have always counted the document as saved all the same.
-    ZephSaveVisualizerXML(context.createdAt, context.files, simulation);
+    const bool written = ZephSaveVisualizerXML(context.createdAt, context.files, simulation);
     simulation.SimulationDirty = false;
     context.files.host.setStatusPanel(1, "");
     autosave.Tag = 0;
     simulation.FileUpgraded = false;
     context.face.documentSaved();
+    return written;
 }
 
 }  // namespace
@@ -52,23 +53,23 @@ bool ZephBackUpUpgradedFile(const std::string& fullPath, Host& host) {
                            BoxIcon::Question, BoxButtons::YesNo) == BoxAnswer::Yes;
 }
 
-void mnuFileSave_Click(const SaveContext& context, ZephSimulation& simulation, AutoSaveState& autosave) try {
+bool mnuFileSave_Click(const SaveContext& context, ZephSimulation& simulation, AutoSaveState& autosave) try {
     if (simulation.FileName.empty()) {
-        mnuFileSaveAs_Click(context, simulation, autosave);
+        const bool written = mnuFileSaveAs_Click(context, simulation, autosave);
         simulation.FileUpgraded = false;
-        return;
+        return written;
     }
     const bool goesOn = !simulation.FileUpgraded ||
                         ZephBackUpUpgradedFile(simulation.FilePath + simulation.FileName, context.files.host);
-    if (goesOn) saveAndTell(context, simulation, autosave);
+    return goesOn && saveAndTell(context, simulation, autosave);
 }
-ZEPH_GUARD(context.files.failures, kModule, )
+ZEPH_GUARD(context.files.failures, kModule, false)
 
-void mnuFileSaveAs_Click(const SaveContext& context, ZephSimulation& simulation, AutoSaveState& autosave) try {
+bool mnuFileSaveAs_Click(const SaveContext& context, ZephSimulation& simulation, AutoSaveState& autosave) try {
     std::string chosen;
-    if (!context.face.chooseOutputFile(chosen)) return;
+    if (!context.face.chooseOutputFile(chosen)) return false;
     simulation.FilePath = ZephPathFromFullPath(chosen);
     simulation.FileName = ZephNameFromFullPath(chosen);
-    saveAndTell(context, simulation, autosave);
+    return saveAndTell(context, simulation, autosave);
 }
-ZEPH_GUARD(context.files.failures, kModule, )
+ZEPH_GUARD(context.files.failures, kModule, false)

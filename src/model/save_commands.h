@@ -5,9 +5,6 @@
 #include "model/autosave.h"
 #include "model/editor_loader.h"
 
-inline constexpr std::string_view kSaveDialogTitle = "Save File";
-inline constexpr std::string_view kEditorFileFilter = "Zeph Editor Environment Files (ZEE)|*.zee";
-
 class SaveFace {
 public:
     virtual ~SaveFace() = default;
@@ -28,7 +25,7 @@ struct SaveContext {
 [[nodiscard]] bool ZephBackUpUpgradedFile(const std::string& fullPath, Host& host);
 
 // Saves under the document's own name; a document without one is asked for it. The document counts as saved even
-// when the disk refused, which was told.
-void mnuFileSave_Click(const SaveContext& context, ZephSimulation& simulation, AutoSaveState& autosave);
+// when the disk refused, which was told. True where the file was written.
+bool mnuFileSave_Click(const SaveContext& context, ZephSimulation& simulation, AutoSaveState& autosave);
 // Asks for the name first. No back-up: the file of the older version stays as it is.
-void mnuFileSaveAs_Click(const SaveContext& context, ZephSimulation& simulation, AutoSaveState& autosave);
+bool mnuFileSaveAs_Click(const SaveContext& context, ZephSimulation& simulation, AutoSaveState& autosave);

@@ -44,10 +44,11 @@ void switchTo(std::int32_t mode, const UndoContext& context) {
 void putBack(const DocumentSnapshot& document, const UndoContext& context, ZephSimulation& simulation,
              ZephUndoStores& stores) {
     context.files.watcher.selectionCleared();
+    const ZephBackground before = simulation.Background;
     ZephGlobalReset(true, simulation, context.files.watcher);
     stores.Latest = document;
     static_cast<void>(ZephLoadVisualizerXML(document, true, context.files, simulation));
-    context.face.documentReplaced();
+    context.face.documentReplaced(!(simulation.Background == before));
 }
 
 std::string captioned(std::string_view word, std::string_view between, const std::vector<ZephUndoEntry>& store,

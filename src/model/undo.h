@@ -33,8 +33,9 @@ class UndoFace {
 public:
     virtual ~UndoFace() = default;
     virtual void switchMode(int uiState) = 0;
-    // Everything that is made from the records: bulbs of every fixture, background picture, object list, canvas, tools.
-    virtual void documentReplaced() = 0;
+    // Everything that is made from the records: bulbs of every fixture, object list, canvas, tools and, where the
+    // record of the background is another one now, its picture, which takes longer than all the rest.
+    virtual void documentReplaced(bool backgroundChanged) = 0;
 };
 
 struct UndoContext {
@@ -64,9 +65,9 @@ bool ZephRedoLastAction(const UndoContext& context, ZephSimulation& simulation, 
 
 // What the menus and the tool bar show.
 struct UndoCaptions {
-    std::string undoItem;  // mnuUndo, popUndo
-    std::string undoTip;
-    std::string redoItem;  // mnuRedo, popRedo
-    std::string redoTip;
+    std::string undoItem = "Undo";  // mnuUndo, popUndo
+    std::string undoTip = "Undo";
+    std::string redoItem = "Redo";  // mnuRedo, popRedo
+    std::string redoTip = "Redo";
 };
 UndoCaptions ZephUndoCaptions(const ZephUndoStores& stores);

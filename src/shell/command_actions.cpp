@@ -118,8 +118,8 @@ void CommandActions::show(const CommandStates& states, bool frozen) {
 void CommandActions::show(const EditToolBarTexts& texts) {
     action(Command::MoveForward)->setToolTip(toQString(texts.MoveForwardTip));
     action(Command::MoveBackward)->setToolTip(toQString(texts.MoveBackwardTip));
-    setTexts(Command::Undo, toQString(texts.UndoCaption), toQString(texts.UndoTip));
-    setTexts(Command::Redo, toQString(texts.RedoCaption), toQString(texts.RedoTip));
+    setTexts(Command::Undo, toQString(texts.Undo.undoItem), toQString(texts.Undo.undoTip));
+    setTexts(Command::Redo, toQString(texts.Undo.redoItem), toQString(texts.Undo.redoTip));
     setTexts(Command::ObjectProperties, toQString(texts.ObjectProperties), toQString(texts.ObjectProperties));
 }
 

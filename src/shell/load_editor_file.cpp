@@ -1,8 +1,6 @@
 #include "shell/load_editor_file.h"
 
 #include "editor/background.h"
-#include "editor/editor_watcher.h"
-#include "model/editor_loader.h"
 #include "shell/startup.h"
 #include "util/text.h"
 
@@ -17,15 +15,13 @@ void setEditorFile(std::string_view path, ZephSimulation& simulation) {
 
 bool LoadEditorFile(bool quiet, Program& program, SimulationFace& face, FileFace& window) try {
     ZephSimulation& simulation = *program.simulation;
-    EditorStateWatcher watcher(program.editor);
-    ZephGlobalReset(false, simulation, watcher);
+    ZephGlobalReset(false, simulation, program.watcher);
     program.picBackground = QImage();
     face.redrawObjects();
     window.showDocument();
     program.seams.host.pumpEvents();
 
-    const EditorFileContext context{program.settings, program.paths, program.seams.host, program.failures, watcher};
-    if (!ZephLoadVisualizerXML(!quiet, context, simulation)) return false;
+    if (!ZephLoadVisualizerXML(!quiet, program.files, simulation)) return false;
     ZephRebuildStaticFixtureBulbs(simulation, *program.masks, *program.bulbs);
     simulation.SimulationOpen = true;
     program.picBackground = ZephResetBackground(simulation, program.seams.programFolder, program.seams.host);
@@ -33,6 +29,7 @@ bool LoadEditorFile(bool quiet, Program& program, SimulationFace& face, FileFace
     simulation.SimulationDirty = false;
     program.seams.host.setStatusPanel(1, "");
     ZephSwitchMode(kStateSelectFixture, program, face);
+    program.autosave.Tag = 0;
     window.setTitle(ZephWindowTitle(simulation.FileName));
     if (widthPixels(simulation.Background) > kMaxCanvasPixels ||
         heightPixels(simulation.Background) > kMaxCanvasPixels) {

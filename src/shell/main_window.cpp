@@ -4,8 +4,6 @@
 
 #include "editor/canvas_drawing.h"
 #include "engine/dialogs/opengl_window.h"
-#include "model/editor_elements.h"
-#include "model/editor_writer.h"
 #include "shell/recent_files.h"
 #include "shell/startup.h"
 
@@ -30,6 +28,9 @@ frmZephMain::frmZephMain(Program& program, WindowHost& host) : program_(program)
     tmrAdjustBrightness_.setObjectName("tmrAdjustBrightness");
     tmrAdjustBrightness_.setInterval(kAdjustBrightnessMs);
     connect(&tmrAdjustBrightness_, &QTimer::timeout, this, &frmZephMain::tmrAdjustBrightness_Timer);
+    tmrAutoSave_.setObjectName("tmrAutoSave");
+    connect(&tmrAutoSave_, &QTimer::timeout, this, &frmZephMain::tmrAutoSave_Timer);
+    tmrAutoSave_.start(kAutoSaveTickMs);
     program_.seams.socket.dataArrival = [this] { dataArrived(); };
     program_.seams.socket.connectionRequest = [this](std::int64_t request) {
         Winsock1_ConnectionRequest(request, program_.seams.socket, host_, program_.failures);
@@ -121,19 +122,10 @@ void frmZephMain::closeEvent(QCloseEvent* event) {
     if (leave) QCoreApplication::quit();  // the OpenGL engine hides this window, so being hidden is no reason to quit
 }
 
-bool frmZephMain::saveDocument() {
-    ZephSimulation& simulation = *program_.simulation;
-    if (simulation.FileName.empty() || simulation.FileUpgraded) return false;
-    const EditorFileContext context{program_.settings, program_.paths, host_, program_.failures,
-                                    program_.seams.watcher};
-    if (!ZephSaveVisualizerXML(createdAtNow(), context, simulation)) return false;
-    simulation.SimulationDirty = false;
-    return true;
-}
-
 void frmZephMain::stopTimers() {
     hrTimer1_.stop();
     tmrAdjustBrightness_.stop();
+    tmrAutoSave_.stop();
 }
 
 QRect frmZephMain::windowPlace() const {

@@ -3,8 +3,11 @@
 #pragma once
 
 #include "editor/mode_commands.h"
+#include "editor/object_operations.h"
+#include "model/save_commands.h"
 #include "shell/command_actions.h"
 #include "shell/command_icons.h"
+#include "shell/file_dialogs.h"
 #include "shell/load_editor_file.h"
 #include "shell/object_panel.h"
 #include "shell/shutdown.h"
@@ -26,6 +29,9 @@ class frmZephMain : public QMainWindow,
                     private SimulationFace,
                     private FileFace,
                     private ShutdownFace,
+                    private SaveFace,
+                    private AutoSaveFace,
+                    private UndoFace,
                     public StartupFace {
 public:
     frmZephMain(Program& program, WindowHost& host);
@@ -47,12 +53,15 @@ private:
     void runCommand(Command command);
     void mnuFileLoad_Click() override;
     void mnuRecentFiles_Click(int index) override;
+    bool mnuFileSave_Click();  // true: the file was written
+    void mnuFileSaveAs_Click();
     void mnuFileOptions_Click();
     void mnuFileExit_Click();
     void mnuHelpAbout_Click();
     void cmdStop_MouseUp();
     void sldIntensity_Scroll();
     void tmrAdjustBrightness_Timer();
+    void tmrAutoSave_Timer();
     void tick();
     void dataArrived();
 
@@ -87,6 +96,16 @@ private:
     QRect windowPlace() const override;
     int windowState() const override;
     ToolBandLayout toolBands() const override { return toolBands_; }
+    // SaveFace
+    bool chooseOutputFile(std::string& fullPath) override;
+    void addRecentFile(std::string_view fullPath) override;
+    void documentSaved() override;
+    // AutoSaveFace
+    std::string statusPanel2() override;
+    void save() override;
+    // UndoFace
+    void switchMode(int uiState) override;
+    void documentReplaced(bool backgroundChanged) override;
     // FileFace
     void showDocument() override;
     void setTitle(std::string_view windowTitle) override;
@@ -96,6 +115,7 @@ private:
     void placeAtStart();
     void showEditorControls(bool shown);
     void UpdateRecentFileMenu();
+    EditContext editContext();
     // Asks before unsaved work is given up. True: go on.
     bool mayLoad(std::string_view titleSuffix);
     // A key that went down in this form. True where it is swallowed.
@@ -110,6 +130,7 @@ private:
     Program& program_;
     WindowHost& host_;
     ProgramModes modes_{program_, *this};
+    WindowFileDialogs dialogs_{program_, host_};
     WindowKeys keys_;
     CommandStates states_;
     EditToolBarTexts texts_;
@@ -122,6 +143,7 @@ private:
     StatusRow* StatusBar1_ = nullptr;
     QTimer hrTimer1_;
     QTimer tmrAdjustBrightness_;
+    QTimer tmrAutoSave_{this};
     int lastIntensity_ = 500;  // of sldIntensity at the timer's last tick; the first tick always sees a move
 
     bool movingList_ = false;      // the re-entry flag of the keyboard: Tab is moving the list

@@ -1,6 +1,7 @@
 // The main window's commands: what menus, buttons, keys and the object list lead to, and showing what is available.
 #include "editor/background.h"
-#include "model/data_directories.h"
+#include "editor/insert_object.h"
+#include "editor/undo_commands.h"
 #include "shell/dialogs/about_dialog.h"
 #include "shell/edit_options.h"
 #include "shell/main_window.h"
@@ -8,18 +9,19 @@
 
 #include <QAction>
 #include <QApplication>
-#include <QFileDialog>
 #include <QKeyEvent>
 #include <QMenu>
 
 namespace {
 
-constexpr int kEditorFolder = 1;
 constexpr std::string_view kModule = "frmZephMain";
 
-// Clipboard and undo stores are not there yet; what depends on them is computed as with empty ones.
 CommandInputs commandInputs(const Program& program) {
-    return {*program.simulation, program.editor, 0, {}, program.settings.FixtureTextLocation, false};
+    return {*program.simulation,
+            program.editor,
+            {program.undo.UndoPosition, program.undo.RedoPosition},
+            program.settings.FixtureTextLocation,
+            false};
 }
 
 }  // namespace
@@ -29,12 +31,30 @@ void frmZephMain::runCommand(Command command) {
     case Command::FileLoad:
         mnuFileLoad_Click();
         break;
+    case Command::FileSave:
+        mnuFileSave_Click();
+        break;
+    case Command::FileSaveAs:
+        mnuFileSaveAs_Click();
+        break;
     case Command::FileOptions:
         mnuFileOptions_Click();
         break;
     case Command::FileExit:
         mnuFileExit_Click();
         return;
+    case Command::Undo:
+        mnuUndo_Click(editContext());
+        break;
+    case Command::Redo:
+        mnuRedo_Click(editContext());
+        break;
+    case Command::InsertFixture:
+        mnuInsertFixture_Click(editContext());
+        break;
+    case Command::InsertProp:
+        mnuInsertProp_Click(editContext());
+        break;
     case Command::ItemTool:
         mnuItemTool_Click(modes_.context());
         break;
@@ -58,8 +78,7 @@ bool frmZephMain::openFile(const QString& path, bool quiet) {
     setEditorFile(path.toStdString(), *program_.simulation);
     const bool loaded = LoadEditorFile(quiet, program_, *this, *this);
     if (loaded) {
-        ZephUpdateRecentFilesList(program_.simulation->FilePath + program_.simulation->FileName, program_.settings);
-        UpdateRecentFileMenu();
+        addRecentFile(program_.simulation->FilePath + program_.simulation->FileName);
     } else {
         program_.simulation->FilePath.clear();
         program_.simulation->FileName.clear();
@@ -79,11 +98,8 @@ bool frmZephMain::mayLoad(std::string_view titleSuffix) {
 
 void frmZephMain::mnuFileLoad_Click() try {
     if (mayLoad("-Load?")) {
-        const QString folder =
-            QString::fromStdString(ZephReturnDataDirectory(kEditorFolder, program_.paths, program_.settings));
-        const QString file = QFileDialog::getOpenFileName(this, tr("Load File"), folder,
-                                                          tr("Zeph Editor Environment Files (ZEE) (*.zee)"));
-        if (!file.isEmpty()) openFile(file, false);
+        std::string file;
+        if (dialogs_.chooseInput(kLoadEditorFile, file)) openFile(QString::fromStdString(file), false);
     }
     CheckEnable(false);
 }
@@ -206,7 +222,7 @@ void frmZephMain::showModeButtons() {
 void frmZephMain::CheckEnable(bool forceEnable) try {
     const CommandInputs inputs = commandInputs(program_);
     ::CheckEnable(forceEnable, inputs, states_);
-    SetEditToolBarTips(*program_.simulation, program_.editor, inputs.undo, "", "", texts_);
+    SetEditToolBarTips(*program_.simulation, program_.editor, program_.undo, texts_);
     const bool frozen = program_.simulating() || drawingInProgress(program_.editor);
     commands_->show(states_, frozen);
     commands_->show(texts_);

@@ -2,16 +2,15 @@
 // handed parts of it by reference.
 #pragma once
 
-#include "editor/editor_state.h"
+#include "editor/editor_watcher.h"
 #include "engine/bulb_images.h"
 #include "engine/light_commands.h"
 #include "engine/opengl_surface.h"
 #include "engine/render_cycle.h"
 #include "engine/standard_surface.h"
 #include "link/communications.h"
+#include "model/autosave.h"
 #include "model/dimming_curve.h"
-#include "model/document.h"
-#include "model/settings.h"
 #include "util/command_line.h"
 #include "util/error_log.h"
 #include "util/paths.h"
@@ -28,7 +27,6 @@ struct ProgramSeams {
     Host& host;
     const Clock& clock;
     SimulationSocket& socket;
-    DocumentWatcher& watcher;
     SettingsStore& store;
     AdapterLister lister;
     std::string dataFolder;     // base of the user's data folders
@@ -38,6 +36,8 @@ struct ProgramSeams {
 
 struct Program {
     Program(ProgramSeams seams, CommandLineParms parms);
+    Program(const Program&) = delete;  // its parts refer to one another
+    Program& operator=(const Program&) = delete;
 
     ProgramSeams seams;
     CommandLineParms parms;
@@ -47,6 +47,10 @@ struct Program {
     bool StartupLoading = false;
     int RenderEngine = kEngineStandard;
     ZephEditorState editor;
+    ZephUndoStores undo;
+    AutoSaveState autosave;
+    EditorStateWatcher watcher{editor, undo};
+    EditorFileContext files{settings, paths, seams.host, failures, watcher};
 
     std::unique_ptr<ZephSimulation> simulation = std::make_unique<ZephSimulation>();
     ZephDimmingCurve curve{};

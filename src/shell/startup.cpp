@@ -36,7 +36,7 @@ bool ZephReadSettingsAtStart(Program& program) {
         return false;
     }
     program.RenderEngine = renderEngineOf(program.settings);
-    ZephGlobalReset(false, *program.simulation, program.seams.watcher);
+    ZephGlobalReset(false, *program.simulation, program.watcher);
     return true;
 }
 

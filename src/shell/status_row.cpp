@@ -67,6 +67,10 @@ void StatusRow::setPanel(int panel, const QString& text) {
     label.setToolTip(text);
 }
 
+QString StatusRow::panel(int panel) const {
+    return panels_.at(static_cast<std::size_t>(panel))->text();
+}
+
 void StatusRow::showQueueGauge(bool shown) {
     prbQueueLen_->setVisible(shown);
 }

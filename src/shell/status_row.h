@@ -18,6 +18,7 @@ public:
     explicit StatusRow(QWidget* parent);
 
     void setPanel(int panel, const QString& text);  // panel 1..4, others are ignored
+    QString panel(int panel) const;                 // the text it shows
     void showQueueGauge(bool shown);
     void showQueueLength(const QueueGaugeUpdate& update);
     void showSimulationButtons(bool shown);

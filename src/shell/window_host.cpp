@@ -3,6 +3,7 @@
 #include "engine/dialogs/compile_errors_dialog.h"
 
 #include <QApplication>
+#include <QFileDialog>
 #include <QMessageBox>
 
 namespace {
@@ -56,6 +57,11 @@ QString toQString(std::string_view utf8) {
     return QString::fromUtf8(utf8.data(), static_cast<qsizetype>(utf8.size()));
 }
 
+QWidget* WindowHost::owner() const {
+    QWidget* dialog = QApplication::activeModalWidget();
+    return dialog != nullptr ? dialog : window_;
+}
+
 void WindowHost::attach(QWidget* window, PanelWriter panels) {
     window_ = window;
     panels_ = std::move(panels);
@@ -65,11 +71,11 @@ BoxAnswer WindowHost::messageBox(std::string_view title, std::string_view text, 
     // An hourglass over a box that waits for a click would mislead.
     const bool wasBusy = busy_;
     setBusyPointer(false);
-    // Over an open dialog the box belongs to that dialog, or it could come to lie behind it.
-    QWidget* dialog = QApplication::activeModalWidget();
     QMessageBox box(boxIcon(icon), toQString(title), toQString(text).replace("\r\n", "\n"), boxButtons(buttons),
-                    dialog != nullptr ? dialog : window_);
+                    owner());
     box.setTextFormat(Qt::PlainText);
+    // A hasty Enter must not lose what a warning is about.
+    if (icon == BoxIcon::Warning) box.setDefaultButton(QMessageBox::No);
     const BoxAnswer answer = box.exec() == 0 && buttons == BoxButtons::Ok
                                  ? BoxAnswer::Ok
                                  : boxAnswer(box.standardButton(box.clickedButton()));
@@ -98,6 +104,15 @@ void WindowHost::showCompileErrors(std::string_view text) {
     dialog.SetErrorMessage(toQString(text));
     dialog.exec();
     setBusyPointer(wasBusy);
+}
+
+QString WindowHost::askFile(const FileDialog& dialog, const QString& folder, bool save) {
+    const QStringList filter = toQString(dialog.filter).split('|');
+    QFileDialog box(owner(), toQString(dialog.title), folder, QString("%1 (%2)").arg(filter.value(0), filter.value(1)));
+    box.setAcceptMode(save ? QFileDialog::AcceptSave : QFileDialog::AcceptOpen);
+    box.setFileMode(save ? QFileDialog::AnyFile : QFileDialog::ExistingFile);
+    box.setOption(QFileDialog::DontConfirmOverwrite);  // the name may still lack its extension
+    return box.exec() == QDialog::Accepted ? box.selectedFiles().value(0) : QString();
 }
 
 void WindowHost::pumpEvents() {

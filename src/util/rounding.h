@@ -1,5 +1,5 @@
-// The only place where real numbers become whole ones. Each conversion names its rule; a result that does not fit
-// 32 bits saturates.
+// The only place where real numbers become whole ones, and wide ones narrow. Each conversion names its rule; a result
+// that does not fit 32 bits saturates.
 #pragma once
 
 #include <cmath>
@@ -28,6 +28,13 @@ inline std::int32_t floorToInt(double value) noexcept {
 // The fraction is cut off: -0.5 -> 0.
 inline std::int32_t truncateToInt(double value) noexcept {
     return rounding_detail::saturate(std::trunc(value));
+}
+
+// A sum or product of 32-bit numbers back into 32 bits.
+constexpr std::int32_t saturate(std::int64_t value) noexcept {
+    constexpr std::int64_t low = std::numeric_limits<std::int32_t>::min();
+    constexpr std::int64_t high = std::numeric_limits<std::int32_t>::max();
+    return static_cast<std::int32_t>(value < low ? low : value > high ? high : value);
 }
 
 // Into 0..255.

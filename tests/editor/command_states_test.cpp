@@ -41,7 +41,7 @@ Commands together(std::initializer_list<Commands> lists) {
 TEST(CheckEnable, WithoutADocumentOffersOnlyFilesOptionsHelpAndExit) {
     EditorRig rig;
     rig.simulation->SimulationOpen = false;
-    rig.clipboard = 3;
+    rig.editor.ZephClipboard.resize(3);
     rig.undo = {2, 2};
     rig.select(kStateSelectFixture, 1);
     CommandStates states;
@@ -106,7 +106,7 @@ TEST(CheckEnable, AnEmptyDocumentCanBeDrawnOnButNotSelectedIn) {
 
 TEST(CheckEnable, ClipboardAndUndoNeedSomethingToGiveBack) {
     EditorRig rig;
-    rig.clipboard = 1;
+    rig.editor.ZephClipboard.resize(1);
     rig.undo = {1, 0};
     CommandStates states;
     CheckEnable(false, rig.inputs(), states);
@@ -154,7 +154,7 @@ TEST(CheckEnable, AButtonFollowsItsCommand) {
 TEST(CheckEnable, TheBandHidesNamesOnlyWhereNamesHaveAPlace) {
     EditorRig rig;
     OptionsBandState band;
-    OptionsToolbandCheckEnable({*rig.simulation, rig.editor, 0, {}, 0, false}, band);
+    OptionsToolbandCheckEnable({*rig.simulation, rig.editor, {}, 0, false}, band);
     EXPECT_FALSE(band.chkNames);
     EXPECT_TRUE(band.sldIntensity);
     OptionsToolbandCheckEnable(rig.inputs(), band);
@@ -200,27 +200,28 @@ TEST(CommandTable, GivesNoKeyAndNoAcceleratorTwice) {
 TEST(ToolBarTexts, NameTheLevelAndTheTopOfTheStores) {
     EditorRig rig;
     EditToolBarTexts texts;
+    ZephUndoStores stores;
+    stores.UndoStore.push_back({kUndoCut, "Cut Wreath", kStateSelectFixture, 1, {}});
+    stores.UndoPosition = 1;
     rig.select(kStateSelectFixture, 1);
-    SetEditToolBarTips(*rig.simulation, rig.editor, {1, 0}, "Cut of Wreath", "", texts);
+    SetEditToolBarTips(*rig.simulation, rig.editor, stores, texts);
     EXPECT_EQ(texts.MoveForwardTip, "Move Forward (to level:6)");
     EXPECT_EQ(texts.MoveBackwardTip, "Move Backward (to level:4)");
-    EXPECT_EQ(texts.UndoTip, "Undo: Cut of Wreath");
-    EXPECT_EQ(texts.UndoCaption, "Undo Cut of Wreath");
-    EXPECT_EQ(texts.RedoTip, "Redo");
+    EXPECT_EQ(texts.Undo.undoTip, "Undo: Cut Wreath");
+    EXPECT_EQ(texts.Undo.undoItem, "Undo Cut Wreath");
+    EXPECT_EQ(texts.Undo.redoTip, "Redo");
     EXPECT_EQ(texts.ObjectProperties, "Fixture Properties");
     rig.select(kStateSelectFixture, 2);
-    SetEditToolBarTips(*rig.simulation, rig.editor, {0, 4}, "", "Move", texts);
+    SetEditToolBarTips(*rig.simulation, rig.editor, {}, texts);
     EXPECT_EQ(texts.MoveForwardTip, "Move Forward");
     EXPECT_EQ(texts.MoveBackwardTip, "Move Backward (to level:15)");
-    EXPECT_EQ(texts.UndoCaption, "Undo");
-    EXPECT_EQ(texts.RedoTip, "Redo: Move");
-    EXPECT_EQ(texts.RedoCaption, "Redo Move");
+    EXPECT_EQ(texts.Undo.undoItem, "Undo");
     rig.select(kStateSelectProp, 3);
-    SetEditToolBarTips(*rig.simulation, rig.editor, {}, "", "", texts);
+    SetEditToolBarTips(*rig.simulation, rig.editor, {}, texts);
     EXPECT_EQ(texts.MoveForwardTip, "Move Forward");
     EXPECT_EQ(texts.ObjectProperties, "Prop Properties");
     rig.editor.ZephUIState = kStateDrawing;
-    SetEditToolBarTips(*rig.simulation, rig.editor, {}, "", "", texts);
+    SetEditToolBarTips(*rig.simulation, rig.editor, {}, texts);
     EXPECT_EQ(texts.ObjectProperties, "Prop Properties");  // a state that selects nothing leaves it
 }
 

@@ -42,11 +42,10 @@ struct EditorRig {
         editor.ZephInProgressIndex = ++simulation->FixtureCount;
         editor.ZephInProgressFixture.PointCount = 1;
     }
-    CommandInputs inputs() const { return {*simulation, editor, clipboard, undo, 1, false}; }
+    CommandInputs inputs() const { return {*simulation, editor, undo, 1, false}; }
 
     std::unique_ptr<ZephSimulation> simulation = std::make_unique<ZephSimulation>();
     ZephEditorState editor;
-    std::int32_t clipboard = 0;
     UndoSummary undo;
 };
 

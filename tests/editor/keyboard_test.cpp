@@ -50,7 +50,7 @@ TEST(Keyboard, AnswersByStateAndSelection) {
     };
     for (const Row& row : rows) {
         EditorRig rig;
-        rig.clipboard = 1;
+        rig.editor.ZephClipboard.resize(1);
         rig.select(row.state, row.fixture);
         EXPECT_EQ(answer(rig, row.down), (KeyAnswer{row.action, row.command})) << row.name;
         rig.simulation->SimulationOpen = false;
@@ -73,7 +73,7 @@ TEST(Keyboard, LeavesKeysToOthers) {
     EXPECT_EQ(answer(rig, {kKeyDel}, {false, false}), KeyAnswer{});  // the focus is elsewhere
     EXPECT_EQ(answer(rig, {kKeyTab}, {true, true}), KeyAnswer{});    // Tab is moving the list already
     EXPECT_EQ(answer(rig, {kKeyApps}, {}, !kMenu), KeyAnswer{});
-    rig.clipboard = 0;
+    rig.editor.ZephClipboard.clear();
     EXPECT_EQ(answer(rig, {kKeyV, true}), KeyAnswer{});
     rig.simulation->FixtureCount = 0;
     EXPECT_EQ(answer(rig, {kKeyTab}), KeyAnswer{});

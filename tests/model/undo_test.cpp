@@ -21,7 +21,7 @@ struct UndoBench : LoadBench, UndoFace {
         ZephUIState = uiState;
         modes.push_back(uiState);
     }
-    void documentReplaced() override { ++replaced; }
+    void documentReplaced(bool) override { ++replaced; }
 
     std::int32_t add(std::int32_t action, int object = 0, std::string_view comment = "", bool keepRedo = false) {
         EXPECT_TRUE(ZephAddUndoDataXML(action, object, comment, keepRedo, undo, *simulation, stores));

@@ -38,9 +38,7 @@ struct ShellRig {
     std::string save(ZephSimulation& simulation, const std::string& name) {
         simulation.FilePath = folder.path().toStdString() + "/";
         simulation.FileName = name;
-        EXPECT_TRUE(ZephSaveVisualizerXML(
-            "1/1/2026 0:00:00 AM", {program.settings, program.paths, program.seams.host, program.failures, nobody},
-            simulation));
+        EXPECT_TRUE(ZephSaveVisualizerXML("1/1/2026 0:00:00 AM", program.files, simulation));
         return simulation.FilePath + name;
     }
 
@@ -71,9 +69,8 @@ struct ShellRig {
     Host& host;
     ManualClock clock{100'000};
     ListSocket socket;
-    NoWatcher nobody;
-    Program program{{host, clock, socket, nobody, store, [] { return std::vector<ZephAdapter>{}; },
-                     folder.path().toStdString(), folder.path().toStdString(), 1},
+    Program program{{host, clock, socket, store, [] { return std::vector<ZephAdapter>{}; }, folder.path().toStdString(),
+                     folder.path().toStdString(), 1},
                     {}};
     std::vector<std::string> steps;
 };

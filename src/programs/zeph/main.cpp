@@ -38,9 +38,8 @@ int main(int argc, char** argv) {
     WindowHost host;
     const SystemClock clock;
     QtSimulationSocket socket;
-    NoWatcher watcher;
     FileSettingsStore store(FileSettingsStore::userFile());
-    Program program({host, clock, socket, watcher, store, listSystemAdapters, ZephPathService::userBase(),
+    Program program({host, clock, socket, store, listSystemAdapters, ZephPathService::userBase(),
                      QApplication::applicationDirPath().toStdString(), seedFromSystem()},
                     parmsOf(QApplication::arguments()));
     if (!ZephReadSettingsAtStart(program)) return 0;
