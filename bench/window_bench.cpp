@@ -82,9 +82,8 @@ struct WindowUnderTest {
     SilentHost host;
     SystemClock clock;
     QtSimulationSocket socket;
-    NoWatcher watcher;
     FileSettingsStore store{folder.filePath("settings.ini").toStdString()};
-    Program program{{host, clock, socket, watcher, store, listSystemAdapters, folder.path().toStdString() + "/",
+    Program program{{host, clock, socket, store, listSystemAdapters, folder.path().toStdString() + "/",
                      QFileInfo(ZEPH_PROGRAM).path().toStdString(), seedFromSystem()},
                     {}};
     frmZephMain window{program, host};
@@ -97,8 +96,8 @@ struct WindowUnderTest {
         buildLimitDocument(*limit);
         limit->FilePath = folder.path().toStdString() + "/";
         limit->FileName = "limit.zee";
-        const EditorFileContext files{program.settings, program.paths, host, program.failures, watcher};
-        if (!ZephSaveVisualizerXML("", files, *limit) || !window.openFile(folder.filePath("limit.zee"), false)) {
+        if (!ZephSaveVisualizerXML("", program.files, *limit) ||
+            !window.openFile(folder.filePath("limit.zee"), false)) {
             giveUp("the limit document cannot be opened");
         }
         QApplication::processEvents();

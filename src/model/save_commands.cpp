@@ -11,6 +11,7 @@ namespace {
 
 constexpr std::string_view kModule = "frmZephMain";
 constexpr int kMaxBackups = 1000;
+constexpr std::string_view kNoBackupTitle = "Unable to create backup";
 
 std::string backupName(const std::string& fullPath, int n) {
     const std::string digits = "000" + std::to_string(n);
@@ -41,16 +42,21 @@ bool saveAndTell(const SaveContext& context, ZephSimulation& simulation, AutoSav
 
 bool ZephBackUpUpgradedFile(const std::string& fullPath, Host& host) {
     const std::optional<std::string> name = freeBackupName(fullPath);
-    if (name && QFile::copy(QString::fromStdString(fullPath), QString::fromStdString(*name))) {
-        host.messageBox("File Backup",
-                        "This Zeph file has been updated to the new G4 file format.  Your existing Zeph file has been "
-                        "backed up and is named:\r\n\r\n" +
-                            *name,
-                        BoxIcon::Information);
-        return true;
+    if (!name) {
+        return host.messageBox(kNoBackupTitle, "Unable to create backup G3 Zeph file.  Do you want to continue?",
+                               BoxIcon::Question, BoxButtons::YesNo) == BoxAnswer::Yes;
     }
-    return host.messageBox("Unable to create backup", "Unable to create backup G3 Zeph file.  Do you want to continue?",
-                           BoxIcon::Question, BoxButtons::YesNo) == BoxAnswer::Yes;
+    // A full disk or a closed folder: the save would replace the only copy of the old file.
+    if (!QFile::copy(QString::fromStdString(fullPath), QString::fromStdString(*name))) {
+        host.messageBox(kNoBackupTitle, "Unable to create backup G3 Zeph file.", BoxIcon::Critical);
+        return false;
+    }
+    host.messageBox("File Backup",
+                    "This Zeph file has been updated to the new G4 file format.  Your existing Zeph file has been "
+                    "backed up and is named:\r\n\r\n" +
+                        *name,
+                    BoxIcon::Information);
+    return true;
 }
 
 bool mnuFileSave_Click(const SaveContext& context, ZephSimulation& simulation, AutoSaveState& autosave) try {

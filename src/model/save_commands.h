@@ -20,8 +20,8 @@ struct SaveContext {
     SaveFace& face;
 };
 
-// Copies an editor file to the first free of NAME.bak0001 to NAME.bak1000 and tells its name. Where no copy can be
-// made the user is asked; false when the answer is not to save then.
+// Copies an editor file to the first free of NAME.bak0001 to NAME.bak1000 and tells its name. Where all are taken the
+// user is asked. False when nothing is to be saved: the answer was so, or the copy failed, which was told.
 [[nodiscard]] bool ZephBackUpUpgradedFile(const std::string& fullPath, Host& host);
 
 // Saves under the document's own name; a document without one is asked for it. The document counts as saved even
