@@ -81,5 +81,6 @@ void benchParser(BenchReport& report);
 void benchCommands(BenchReport& report);
 void benchCompile(BenchReport& report);
 void benchMasks(BenchReport& report);
+void benchBlend(BenchReport& report);
 void benchFrame(BenchReport& report);
 void benchGL(BenchReport& report);

@@ -15,9 +15,9 @@ struct Subject {
 };
 
 constexpr Subject kSubjects[] = {
-    {"load", benchLoad},     {"undo", benchUndo},         {"objects", benchObjectFiles},
-    {"parser", benchParser}, {"commands", benchCommands}, {"compile", benchCompile},
-    {"masks", benchMasks},   {"frame", benchFrame},       {"gl", benchGL},
+    {"load", benchLoad},         {"undo", benchUndo},       {"objects", benchObjectFiles}, {"parser", benchParser},
+    {"commands", benchCommands}, {"compile", benchCompile}, {"masks", benchMasks},         {"blend", benchBlend},
+    {"frame", benchFrame},       {"gl", benchGL},
 };
 
 int usage(const char* program) {

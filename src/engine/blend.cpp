@@ -14,25 +14,24 @@ std::uint32_t sourcePixel(const BulbSprite& sprite, std::int32_t x, std::int32_t
     return sprite.Color & sprite.Mask->Lanes[static_cast<std::size_t>(y * sprite.Mask->Stride + x)];
 }
 
-// Exact for value <= 65025: rounds value / 255 to the nearest.
-constexpr std::uint32_t roundedBy255(std::uint32_t value) noexcept {
-    const std::uint32_t t = value + 128;
-    return (t + (t >> 8)) >> 8;
-}
-
 // Exact for value <= 65152: cuts value / 255 off.
 constexpr std::uint32_t cutBy255(std::uint32_t value) noexcept {
     return (value + 1 + (value >> 8)) >> 8;
 }
 static_assert(cutBy255(254) == 0 && cutBy255(255) == 1 && cutBy255(65024) == 254 && cutBy255(65152) == 255);
 
-std::uint32_t blendHard(std::uint32_t color, std::uint32_t destination, std::uint32_t alpha) noexcept {
-    const auto part = [&](int shift) {
-        const std::uint32_t s = (color >> shift) & 255U;
-        const std::uint32_t d = (destination >> shift) & 255U;
-        return roundedBy255(s * alpha + d * (kFull - alpha)) << shift;
-    };
-    return part(0) | part(8) | part(16) | part(24);
+// Two channels at once: each half of the number is at most 65025, so nothing carries over.
+constexpr std::uint32_t kPairs = 0x00FF00FF;
+constexpr std::uint32_t pairsRoundedBy255(std::uint32_t pairs) noexcept {
+    const std::uint32_t t = pairs + 0x00800080;
+    return (t + (t >> 8 & kPairs)) >> 8 & kPairs;
+}
+
+constexpr std::uint32_t blendHard(std::uint32_t color, std::uint32_t destination, std::uint32_t alpha) noexcept {
+    const std::uint32_t keep = kFull - alpha;
+    const std::uint32_t even = pairsRoundedBy255((color & kPairs) * alpha + (destination & kPairs) * keep);
+    const std::uint32_t odd = pairsRoundedBy255((color >> 8 & kPairs) * alpha + (destination >> 8 & kPairs) * keep);
+    return even | odd << 8;
 }
 
 // The two divisions by 255 cut off one after the other give the same as one by 65025.
@@ -74,9 +73,8 @@ void blendRow(const BulbSprite& sprite, std::int32_t y, std::uint32_t alpha, std
             to[x] = blendSoft(from[x], to[x], alpha);
     } else {
         const std::uint32_t* lanes = mask.Lanes.data() + y * mask.Stride;
-        for (std::int32_t x = 8 * blocks.First; x < end; ++x) {
-            if (lanes[x] != 0) to[x] = blendHard(sprite.Color, to[x], alpha);
-        }
+        for (std::int32_t x = 8 * blocks.First; x < end; ++x)
+            to[x] ^= (to[x] ^ blendHard(sprite.Color, to[x], alpha)) & lanes[x];
     }
 }
 
