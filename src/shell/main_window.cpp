@@ -52,7 +52,7 @@ void frmZephMain::setUpToolBars() {
 void frmZephMain::setUpMenus() {
     UpdateRecentFileMenu();
     CheckEnable(true);
-    CoolBar1_->band().show(ZephSetOptionsToolbandStuff(program_.settings, *program_.simulation));
+    showOptionsBand();
 }
 
 void frmZephMain::start() {
@@ -166,6 +166,10 @@ void frmZephMain::redrawObjects() {
 
 void frmZephMain::showDocument() {
     canvas_->scrollToOrigin();
+    showOptionsBand();
+}
+
+void frmZephMain::showOptionsBand() {
     CoolBar1_->band().show(ZephSetOptionsToolbandStuff(program_.settings, *program_.simulation));
 }
 

@@ -45,10 +45,12 @@ protected:
 private:
     // Commands
     void runCommand(Command command);
+    void mnuFileNew_Click();
     void mnuFileLoad_Click() override;
     void mnuRecentFiles_Click(int index) override;
     void mnuFileOptions_Click();
     void mnuFileExit_Click();
+    void mnuBackgroundProperties_Click();
     void mnuHelpAbout_Click();
     void cmdStop_MouseUp();
     void sldIntensity_Scroll();
@@ -89,6 +91,11 @@ private:
     ToolBandLayout toolBands() const override { return toolBands_; }
     // FileFace
     void showDocument() override;
+    void showOptionsBand() override;
+    std::optional<ZephNewSimulationChoice> showNewSimulation() override;
+    std::optional<ZephBackgroundDraft> showBackground(const ZephBackgroundDraft& draft,
+                                                      const BackgroundTerms& terms) override;
+    std::string findPicture(const std::string& missing) override;
     void setTitle(std::string_view windowTitle) override;
 
     void build();
@@ -103,6 +110,10 @@ private:
     KeyAnswer answerTo(const QKeyEvent& event) const;
     void carryOut(const KeyAnswer& answer);
     void moveListRow(bool backward);
+    // The brightness that sldIntensity shows becomes the document's, at once.
+    void takeIntensity();
+    // Where the file dialog looks for pictures first.
+    QString pictureFolder() const;
     void showContextMenu(const QPoint& globalPos);
     // Ends the simulation now, or behind the tick that is under way.
     void requestEnd();
