@@ -32,6 +32,7 @@ bool LoadEditorFile(bool quiet, Program& program, SimulationFace& face, FileFace
     EditorStateWatcher watcher(program.editor);
     ZephGlobalReset(false, simulation, watcher);
     installBackground({}, program);
+    face.ZephLoadUIObjectList();
     face.redrawObjects();
     window.showDocument();
     program.seams.host.pumpEvents();

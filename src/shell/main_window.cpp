@@ -116,6 +116,7 @@ void frmZephMain::closeEvent(QCloseEvent* event) {
         event->ignore();
         return;
     }
+    takeIntensity();  // what is saved on leaving is what the slider shows
     const bool leave = Form_Unload(program_, *this, *this);
     event->setAccepted(leave);
     if (leave) QCoreApplication::quit();  // the OpenGL engine hides this window, so being hidden is no reason to quit
