@@ -1,5 +1,5 @@
-// The only place where real numbers become whole ones. Each conversion names its rule; a result that does not fit
-// 32 bits saturates.
+// The only place where real numbers become whole ones, and wide ones narrow. Each conversion names its rule; a result
+// that does not fit 32 bits saturates.
 #pragma once
 
 #include <cmath>
@@ -30,6 +30,13 @@ inline std::int32_t truncateToInt(double value) noexcept {
     return rounding_detail::saturate(std::trunc(value));
 }
 
+// A sum or product of 32-bit numbers back into 32 bits.
+constexpr std::int32_t saturate(std::int64_t value) noexcept {
+    constexpr std::int64_t low = std::numeric_limits<std::int32_t>::min();
+    constexpr std::int64_t high = std::numeric_limits<std::int32_t>::max();
+    return static_cast<std::int32_t>(value < low ? low : value > high ? high : value);
+}
+
 // Into 0..255.
 constexpr std::int32_t clampByte(std::int32_t value) noexcept {
     return value < 0 ? 0 : value > 255 ? 255 : value;
@@ -55,22 +62,17 @@ constexpr Quotient scaled(std::int32_t value, std::int32_t numerator, std::int32
     if (product % denominator < 0) --whole;
     return {whole, product - whole * denominator};
 }
-constexpr std::int32_t saturate(std::int64_t whole) noexcept {
-    constexpr std::int64_t low = std::numeric_limits<std::int32_t>::min();
-    constexpr std::int64_t high = std::numeric_limits<std::int32_t>::max();
-    return static_cast<std::int32_t>(whole < low ? low : whole > high ? high : whole);
-}
 }  // namespace rounding_detail
 
 // value x numerator / denominator to the nearest whole number, in exact arithmetic: a tie to the even neighbour, or
 // upwards on the number line. The denominator is above 0.
 constexpr std::int32_t scaleHalfEven(std::int32_t value, std::int32_t numerator, std::int32_t denominator) noexcept {
     const auto [whole, rest] = rounding_detail::scaled(value, numerator, denominator);
-    return rounding_detail::saturate(whole + (2 * rest + (whole & 1) > denominator ? 1 : 0));
+    return saturate(whole + (2 * rest + (whole & 1) > denominator ? 1 : 0));
 }
 constexpr std::int32_t scaleHalfUp(std::int32_t value, std::int32_t numerator, std::int32_t denominator) noexcept {
     const auto [whole, rest] = rounding_detail::scaled(value, numerator, denominator);
-    return rounding_detail::saturate(whole + (2 * rest >= denominator ? 1 : 0));
+    return saturate(whole + (2 * rest >= denominator ? 1 : 0));
 }
 
 // Intensity 0..100 to level 0..255, which is intensity x 2.55 in exact arithmetic: once cut off, once rounded.

@@ -73,6 +73,18 @@ TEST(Background, DarkensEachByteAndStopsAtBlack) {
     folder.simulation->Background.PicIntensity = 50;  // 128 less
     const QImage shown = ZephResetBackground(*folder.simulation, folder.path(), folder.host).picBackground;
     EXPECT_EQ(shown.pixel(3, 1), qRgb(122, 72, 0));
+    QImage picture(37, 1, QImage::Format_RGB32);
+    picture.fill(qRgb(0, 99, 250));
+    const struct {
+        std::int32_t offset;
+        QRgb expected;
+    } rows[] = {{5, qRgb(5, 104, 255)}, {6, qRgb(6, 105, 255)}, {255, qRgb(255, 255, 255)},
+                {-99, qRgb(0, 0, 151)}, {-255, qRgb(0, 0, 0)},  {0, qRgb(0, 99, 250)}};
+    for (const auto& row : rows) {
+        QImage changed = picture;
+        ZephDrawFastBrightness(row.offset, changed);
+        EXPECT_EQ(changed.pixel(36, 0), row.expected) << row.offset;
+    }
 }
 
 TEST(Background, LiesBesideTheEditorFileAndFillsTheCanvas) {
