@@ -7,7 +7,7 @@
 #include <algorithm>
 
 ZephBackgroundDraft ZephBackgroundDraftOf(const ZephBackground& background, const ZephSettings& settings) {
-    return {background, settings.ShowGrid, settings.GridDensity, settings.GridColor};
+    return {background, false, settings.ShowGrid, settings.GridDensity, settings.GridColor};
 }
 
 void takeGridOptions(const ZephBackgroundDraft& draft, ZephSettings& settings) {

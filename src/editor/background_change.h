@@ -14,6 +14,7 @@
 // What the background dialog edits: a copy of the record, and the options of the grid.
 struct ZephBackgroundDraft {
     ZephBackground Background;
+    bool PictureChosen = false;       // to be loaded anew, even if it is the same file: it may have been retouched
     std::int32_t GridLineOption = 0;  // row of the grid line table
     std::int32_t GridSpacing = 1;     // tens of pixels, 1..20
     std::int32_t GridLineColor = 0;   // packed

@@ -78,7 +78,7 @@ bool ZephChangeBackgroundProperties(const BackgroundTerms& terms, Program& progr
         window.showBackground(ZephBackgroundDraftOf(before, program.settings), terms);
     if (!edited) return false;
     takeGridOptions(*edited, program.settings);
-    if (edited->Background == before) {
+    if (edited->Background == before && !edited->PictureChosen) {
         face.redrawObjects();  // the grid is no part of the display
     } else {
         applyBackground(edited->Background, program, face, window);

@@ -129,9 +129,13 @@ TEST_F(BackgroundDialogs, APictureIsChosenShownAndTakenAway) {
     EXPECT_EQ(background->draft().Background,
               (ZephBackground{kBackgroundPicture, path("house.png"), 100, 40 * TwipsPerPixelX, 20 * TwipsPerPixelY}));
 
-    draft = background->draft();
+    draft = {background->draft().Background};
     open({true, false, path("house.png"), {}});
     EXPECT_FALSE(background->SimInfoChanged());
+    host.answers = {BoxAnswer::No};
+    click("cmdOpen");  // the same file, which may have been retouched
+    EXPECT_EQ(background->draft().Background, draft.Background);
+    EXPECT_TRUE(background->SimInfoChanged());
     click("cmdNoBackground");
     EXPECT_TRUE(background->SimInfoChanged());
     EXPECT_EQ(shown("lblFileName"), "none");
@@ -231,7 +235,7 @@ TEST_F(BackgroundDialogs, TheGridIsOnlyOptions) {
     click("cmdGridLineColor");
     click("cmdOK");
     EXPECT_FALSE(background->SimInfoChanged());
-    EXPECT_EQ(background->draft(), (ZephBackgroundDraft{draft.Background, 3, 20, 0x112233}));
+    EXPECT_EQ(background->draft(), (ZephBackgroundDraft{draft.Background, false, 3, 20, 0x112233}));
 
     draft.GridLineOption = 1;
     pickColor = [](std::int32_t, const QString&, QWidget*) -> std::optional<std::int32_t> { throw Failure("no"); };

@@ -178,6 +178,7 @@ void frmZephBackground::cmdOpen_Click() {
     if (!picked) return;
     draft_.Background.BackgroundType = kBackgroundPicture;
     draft_.Background.PicFileName = picked->File.toStdString();
+    draft_.PictureChosen = true;
     Image1_ = picked->Image1;
     showPicture();
     if (picked->TakeSize) ResizeSimulation(Image1_.size());
@@ -186,6 +187,7 @@ void frmZephBackground::cmdOpen_Click() {
 void frmZephBackground::cmdNoBackground_Click() {
     draft_.Background.BackgroundType = 0;
     draft_.Background.PicFileName.clear();
+    draft_.PictureChosen = false;
     Image1_ = QImage();
     showPicture();
 }

@@ -36,8 +36,8 @@ public:
 
     bool AllowCancel() const { return terms_.AllowCancel; }
     bool Cancelled() const { return result() != Accepted; }
-    // The background is another one than at opening.
-    bool SimInfoChanged() const { return draft_.Background != atOpening_; }
+    // The background is another one than at opening, or its picture was chosen again.
+    bool SimInfoChanged() const { return draft_.PictureChosen || draft_.Background != atOpening_; }
     // The draft as it was edited; good once the dialog was accepted.
     const ZephBackgroundDraft& draft() const { return draft_; }
 
