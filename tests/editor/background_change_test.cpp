@@ -108,21 +108,6 @@ TEST_F(BackgroundChange, ATypedSizeIsANumberWithinTheLimits) {
     }
 }
 
-TEST(NewSimulation, IsCompleteWithBothSizesAndAPicturesFile) {
-    ZephNewSimulationChoice choice{0, "", 800, 0, 0, 0};
-    EXPECT_FALSE(ZephNewSimulationComplete(choice));
-    choice.HeightPixels = 600;
-    EXPECT_TRUE(ZephNewSimulationComplete(choice));
-    choice.BackgroundType = kBackgroundPicture;
-    EXPECT_FALSE(ZephNewSimulationComplete(choice));
-    choice.BackgroundFileName = "/a.jpg";
-    EXPECT_TRUE(ZephNewSimulationComplete(choice));
-    choice.BackgroundType = 0;
-    EXPECT_EQ(backgroundOf(choice).PicFileName, "");  // chosen, then thought better of
-    EXPECT_EQ(withinMask({9999, 9999}), QSize(9999, 9999));
-    EXPECT_EQ(withinMask({19998, 6000}), QSize(9999, 3000));
-}
-
 TEST_F(BackgroundChange, ANewSimulationKeepsNothingOfTheOldOne) {
     ZephEditorState editor;
     editor.ZephSelection.Object = 2;

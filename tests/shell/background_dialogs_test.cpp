@@ -1,6 +1,5 @@
 #include "shell/dialogs/background_dialog.h"
 #include "shell/dialogs/change_size_dialog.h"
-#include "shell/dialogs/new_simulation_dialog.h"
 #include "tests/support/recording_host.h"
 #include "util/failure.h"
 #include "util/units.h"
@@ -11,7 +10,6 @@
 #include <QFile>
 #include <QLabel>
 #include <QLineEdit>
-#include <QRadioButton>
 #include <QSlider>
 #include <QTemporaryDir>
 #include <QTest>
@@ -34,30 +32,16 @@ struct BackgroundDialogs : testing::Test {
     void open(BackgroundDialogTerms terms = {}) {
         background =
             std::make_unique<frmZephBackground>(draft, std::move(terms), BackgroundDesk{host, pickPicture, pickColor});
-        show(*background);
-    }
-    void openNew() {
-        created = std::make_unique<frmZephNewSimulation>(QString(), host, pickPicture);
-        show(*created);
-    }
-    void show(QDialog& opened) {
-        dialog = &opened;
-        dialog->show();
-        ASSERT_TRUE(QTest::qWaitForWindowActive(dialog));
+        background->show();
     }
     template <typename Widget>
     Widget* find(const char* name) {
-        Widget* widget = dialog->findChild<Widget*>(name);
+        Widget* widget = background->findChild<Widget*>(name);
         if (widget == nullptr) throw Failure(std::string("there is no ") + name);
         return widget;
     }
     void click(const char* name) { QTest::mouseClick(find<QPushButton>(name), Qt::LeftButton); }
     QString shown(const char* label) { return find<QLabel>(label)->text(); }
-    void type(const char* field, const QString& text) {
-        auto* box = find<QLineEdit>(field);
-        box->selectAll();
-        QTest::keyClicks(box, text);
-    }
     QColor previewed() {
         QTest::qWait(100);  // tmrPreview
         const QImage preview = find<QWidget>("picPreview")->grab().toImage();
@@ -84,8 +68,6 @@ struct BackgroundDialogs : testing::Test {
     ColorPicker pickColor = [](std::int32_t, const QString&, QWidget*) { return 0x112233; };
     ZephBackgroundDraft draft;
     std::unique_ptr<frmZephBackground> background;
-    std::unique_ptr<frmZephNewSimulation> created;
-    QDialog* dialog = nullptr;
 };
 
 void typeInto(QDialog& dialog, const char* field, const QString& text) {
@@ -143,28 +125,14 @@ TEST_F(BackgroundDialogs, APictureIsChosenShownAndTakenAway) {
     EXPECT_TRUE(background->Cancelled());
 }
 
-TEST_F(BackgroundDialogs, TheIntensityDarkensThePreview) {
-    draft.Background.BackgroundType = kBackgroundPicture;
-    draft.Background.PicFileName = path("house.png");
-    open({true, false, path("house.png"), {}});
-    auto* slider = find<QSlider>("sldIntensity");
-    slider->setFocus();
-    QTest::keyClick(slider, Qt::Key_Left);
-    EXPECT_EQ(shown("lblIntensity"), "99 %");
-    EXPECT_EQ(previewed(), QColor(197, 97, 47));
-    slider->setValue(0);
-    EXPECT_EQ(previewed(), QColor(0, 0, 0));
-    QTest::keyClick(dialog, Qt::Key_Return);
-    EXPECT_EQ(background->draft().Background.PicIntensity, 0);
-}
-
 TEST_F(BackgroundDialogs, AMissingPictureIsToldOnce) {
     draft.Background.BackgroundType = kBackgroundPicture;
     draft.Background.PicFileName = "/gone/old.png";
     open({true, false, "/gone/old.png", {}});
     previewed();
-    find<QSlider>("sldIntensity")->setValue(50);
-    previewed();
+    QTest::keyClick(find<QSlider>("sldIntensity"), Qt::Key_Home);
+    EXPECT_EQ(shown("lblIntensity"), "0 %");
+    EXPECT_EQ(previewed(), QColor(0, 0, 0));
     ASSERT_EQ(host.boxes.size(), 1U);
     EXPECT_EQ(host.boxes[0].title, "Qen Visualizer-Preview Load Error");
     EXPECT_EQ(host.boxes[0].text,
@@ -197,32 +165,6 @@ TEST_F(BackgroundDialogs, TheSizeDialogKeepsProportionsAndLimits) {
         QTest::keyClick(&size, Qt::Key_Return);
     });
     EXPECT_EQ(shown("lblNewSize"), "2500 x 1876");
-    resize([](frmZephChangeSize& size) {
-        typeInto(size, "txtNewWidth", "7");
-        QTest::keyClick(&size, Qt::Key_Escape);
-    });
-    EXPECT_EQ(shown("lblNewSize"), "2500 x 1876");
-}
-
-TEST_F(BackgroundDialogs, ATooLargeCanvasStaysUntilItIsResized) {
-    draft.Background.EditorWidthTwips = 3000 * TwipsPerPixelX;
-    open({false, true, {}, {}});
-    EXPECT_EQ(shown("lblEditorSize"), "(new)");
-    EXPECT_FALSE(find<QPushButton>("cmdCancel")->isVisible());
-    QTest::keyClick(dialog, Qt::Key_Escape);
-    dialog->close();
-    EXPECT_TRUE(dialog->isVisible());
-    click("cmdOK");
-    ASSERT_EQ(host.boxes.size(), 1U);
-    EXPECT_EQ(host.boxes[0].title, "Qen Visualizer-Maximum Size");
-    EXPECT_TRUE(dialog->isVisible());
-    resize([](frmZephChangeSize& size) {
-        typeInto(size, "txtNewWidth", "2500");
-        QTest::keyClick(&size, Qt::Key_Return);
-    });
-    EXPECT_EQ(shown("lblNewSize"), "2500 x 50");
-    click("cmdOK");
-    EXPECT_FALSE(background->Cancelled());
 }
 
 TEST_F(BackgroundDialogs, TheGridIsOnlyOptions) {
@@ -236,35 +178,4 @@ TEST_F(BackgroundDialogs, TheGridIsOnlyOptions) {
     click("cmdOK");
     EXPECT_FALSE(background->SimInfoChanged());
     EXPECT_EQ(background->draft(), (ZephBackgroundDraft{draft.Background, false, 3, 20, 0x112233}));
-
-    draft.GridLineOption = 1;
-    pickColor = [](std::int32_t, const QString&, QWidget*) -> std::optional<std::int32_t> { throw Failure("no"); };
-    open();
-    click("cmdGridLineColor");
-    ASSERT_EQ(host.boxes.size(), 1U);
-    EXPECT_EQ(host.boxes[0].text, "Error Setting Color");
-}
-
-TEST_F(BackgroundDialogs, ANewSimulationTakesSizesAndAPicture) {
-    openNew();
-    EXPECT_EQ(find<QLineEdit>("mskWidth")->text(), "0");
-    EXPECT_FALSE(find<QPushButton>("OKButton")->isEnabled());
-    type("mskWidth", "12345");
-    EXPECT_EQ(find<QLineEdit>("mskWidth")->text(), "1234");  // four digits
-    EXPECT_FALSE(find<QPushButton>("OKButton")->isEnabled());
-    type("mskHeight", "600");
-    EXPECT_TRUE(find<QPushButton>("OKButton")->isEnabled());
-    QTest::mouseClick(find<QRadioButton>("rdoBackgroundType(2)"), Qt::LeftButton, {}, QPoint(8, 8));
-    EXPECT_FALSE(find<QPushButton>("OKButton")->isEnabled());
-    QTest::mouseClick(find<QRadioButton>("rdoBackgroundType(0)"), Qt::LeftButton, {}, QPoint(8, 8));
-    toPick = folder.filePath("house.png");
-    host.answers = {BoxAnswer::Yes};
-    click("cmdOpen");
-    EXPECT_TRUE(find<QRadioButton>("rdoBackgroundType(2)")->isChecked());
-    EXPECT_EQ(previewed(), QColor(200, 100, 50));
-    QTest::keyClick(dialog, Qt::Key_Return);
-    EXPECT_FALSE(created->Cancelled());
-    const ZephNewSimulationChoice& choice = created->choice();
-    EXPECT_EQ(backgroundOf(choice),
-              (ZephBackground{kBackgroundPicture, path("house.png"), 100, 40 * TwipsPerPixelX, 20 * TwipsPerPixelY}));
 }

@@ -9,6 +9,7 @@
 #include <QLineEdit>
 #include <QPointer>
 #include <QPushButton>
+#include <QRadioButton>
 #include <QSlider>
 #include <QTest>
 #include <QTimer>
@@ -77,6 +78,17 @@ struct BackgroundWindow : testing::Test {
     static void type(QDialog& dialog, const char* field, const char* text) {
         dialog.findChild<QLineEdit*>(field)->setText(text);
     }
+    // Through the size dialog, which keeps the proportions.
+    static void resizeAndAccept(QDialog& dialog, const char* width) {
+        QTimer::singleShot(0, &dialog, [width] {
+            auto* size = qobject_cast<QDialog*>(QApplication::activeModalWidget());
+            size->findChild<QLineEdit*>("txtNewWidth")->selectAll();
+            QTest::keyClicks(size->findChild<QLineEdit*>("txtNewWidth"), width);
+            press(*size, "cmdOK");
+        });
+        press(dialog, "cmdResize");
+        press(dialog, "cmdOK");
+    }
     const ZephSimulation& document() const { return *rig.program.simulation; }
     QColor canvasAt(int x, int y) { return window.findChild<QWidget*>("picMain")->grab().toImage().pixelColor(x, y); }
     std::vector<std::string> titles() const {
@@ -113,9 +125,20 @@ TEST_F(BackgroundWindow, ANewSimulationAsksFirstAndReplacesTheOldOne) {
         EXPECT_EQ(dialog.objectName(), "frmZephNewSimulation");
         const QWidget* band = window.findChild<QWidget*>("CoolBar1");
         EXPECT_GE(dialog.y(), band->mapToGlobal(QPoint(0, band->height())).y());
+        auto* ok = dialog.findChild<QPushButton*>("OKButton");
+        auto* width = dialog.findChild<QLineEdit*>("mskWidth");
+        EXPECT_EQ(width->text(), "0");
+        width->selectAll();
+        QTest::keyClicks(width, "7-01234");
+        EXPECT_EQ(width->text(), "7012");  // four digits
+        EXPECT_FALSE(ok->isEnabled());
         type(dialog, "mskWidth", "70");
         type(dialog, "mskHeight", "50");
-        press(dialog, "OKButton");
+        EXPECT_TRUE(ok->isEnabled());
+        dialog.findChild<QRadioButton*>("rdoBackgroundType(2)")->click();
+        EXPECT_FALSE(ok->isEnabled());  // no file
+        dialog.findChild<QRadioButton*>("rdoBackgroundType(0)")->click();
+        QTest::keyClick(&dialog, Qt::Key_Return);
     }});
     run("mnuFileNew");
     EXPECT_EQ(document().FixtureCount, 0);
@@ -141,14 +164,7 @@ TEST_F(BackgroundWindow, ANewSimulationThatIsTooLargeGoesThroughTheBackgroundDia
     EXPECT_EQ(document().FixtureCount, 1);
     expectDialogs({tooLarge, [](QDialog& dialog) {
                        EXPECT_EQ(dialog.findChild<QLabel*>("lblEditorSize")->text(), "(new)");
-                       QTimer::singleShot(0, &dialog, [] {
-                           auto* size = qobject_cast<QDialog*>(QApplication::activeModalWidget());
-                           size->findChild<QLineEdit*>("txtNewWidth")->selectAll();
-                           QTest::keyClicks(size->findChild<QLineEdit*>("txtNewWidth"), "2500");
-                           press(*size, "cmdOK");
-                       });
-                       press(dialog, "cmdResize");
-                       press(dialog, "cmdOK");
+                       resizeAndAccept(dialog, "2500");
                    }});
     run("mnuFileNew");
     EXPECT_EQ(document().FileName, "");
@@ -164,14 +180,7 @@ TEST_F(BackgroundWindow, TheBackgroundDialogMovesPointsAndKeepsTheBandInStep) {
         auto* slider = dialog.findChild<QSlider*>("sldIntensity");
         EXPECT_EQ(slider->value(), 90);
         slider->setValue(50);
-        QTimer::singleShot(0, &dialog, [] {
-            auto* size = qobject_cast<QDialog*>(QApplication::activeModalWidget());
-            size->findChild<QLineEdit*>("txtNewWidth")->selectAll();
-            QTest::keyClicks(size->findChild<QLineEdit*>("txtNewWidth"), "120");
-            press(*size, "cmdOK");
-        });
-        press(dialog, "cmdResize");
-        press(dialog, "cmdOK");
+        resizeAndAccept(dialog, "120");
     }});
     run("mnuBackgroundProperties");
     EXPECT_EQ(band->value(), 50);
@@ -185,17 +194,14 @@ TEST_F(BackgroundWindow, TheBackgroundDialogMovesPointsAndKeepsTheBandInStep) {
     EXPECT_EQ(window.findChild<QLabel*>("StatusBar1Panel1")->text(), "Changed");
     QTest::qWait(800);
     EXPECT_EQ(document().Background.PicIntensity, 50);  // the band's timer has nothing left to say
-
-    rig.program.simulation->SimulationDirty = false;
-    const ZephSimulation before = document();
-    expectDialogs({
-        [](QDialog& dialog) { press(dialog, "cmdOK"); },
-    });
-    run("mnuBackgroundProperties");
-    EXPECT_TRUE(document() == before);
 }
 
-TEST_F(BackgroundWindow, AMissingPictureIsOfferedAgainUnlessTheLoadIsQuiet) {
+TEST_F(BackgroundWindow, APictureIsFoundBesideTheDisplayOrAskedForUnlessTheLoadIsQuiet) {
+    const std::string house = rig.folder.filePath("house.png").toStdString();
+    ASSERT_TRUE(open("/old/place/house.png"));
+    EXPECT_TRUE(titles().empty());
+    EXPECT_EQ(document().Background.PicFileName, house);
+    EXPECT_FALSE(document().SimulationDirty);
     ASSERT_TRUE(open("/gone/other.png", true));
     EXPECT_EQ(titles(), Titles{"-Picture Load Error"});
     EXPECT_EQ(document().Background.PicFileName, "/gone/other.png");
@@ -220,16 +226,8 @@ TEST_F(BackgroundWindow, AMissingPictureIsOfferedAgainUnlessTheLoadIsQuiet) {
     expectDialogs({choose("bulb.zee"), choose("house.png")});
     ASSERT_TRUE(open("/gone/other.png"));
     EXPECT_EQ(titles(), (Titles{"-Picture Load Error", "-Picture Load Error"}));  // not found; then no picture
-    EXPECT_EQ(document().Background.PicFileName, rig.folder.filePath("house.png").toStdString());
+    EXPECT_EQ(document().Background.PicFileName, house);
     EXPECT_TRUE(document().SimulationDirty);
-    EXPECT_EQ(canvasAt(55, 25), QColor(200, 100, 50));
-}
-
-TEST_F(BackgroundWindow, AMovedDisplayNamesThePictureThatItFound) {
-    ASSERT_TRUE(open("/old/place/house.png"));
-    EXPECT_TRUE(titles().empty());
-    EXPECT_EQ(document().Background.PicFileName, rig.folder.filePath("house.png").toStdString());
-    EXPECT_FALSE(document().SimulationDirty);
     EXPECT_EQ(canvasAt(55, 25), QColor(200, 100, 50));
 }
 
@@ -238,14 +236,7 @@ TEST_F(BackgroundWindow, ALoadedDisplayThatIsTooLargeMustBeResized) {
         EXPECT_FALSE(dialog.findChild<QPushButton*>("cmdCancel")->isVisible());
         QTest::keyClick(&dialog, Qt::Key_Escape);
         EXPECT_TRUE(dialog.isVisible());
-        QTimer::singleShot(0, &dialog, [] {
-            auto* size = qobject_cast<QDialog*>(QApplication::activeModalWidget());
-            size->findChild<QLineEdit*>("txtNewWidth")->selectAll();
-            QTest::keyClicks(size->findChild<QLineEdit*>("txtNewWidth"), "2500");
-            press(*size, "cmdOK");
-        });
-        press(dialog, "cmdResize");
-        press(dialog, "cmdOK");
+        resizeAndAccept(dialog, "2500");
     }});
     ASSERT_TRUE(open("", false, 2501));
     EXPECT_EQ(titles(), Titles{"-Maximum Size"});
