@@ -41,6 +41,6 @@ install_packages() {
 BUILD_PACKAGES=(g++ cmake ninja-build ccache pkg-config qt6-base-dev qt6-svg-dev libegl-dev libpugixml-dev libgtest-dev
     libgmock-dev libpixman-1-dev)
 # What looking at the result takes besides: the platform plugin's own needs come with qt6-base-dev.
-RUN_PACKAGES=(ffmpeg libgl1-mesa-dri)
+RUN_PACKAGES=(ffmpeg libgl1-mesa-dri qt6-image-formats-plugins)
 # What checking takes besides.
 TEST_PACKAGES=(git clang-14 libclang-rt-14-dev clang-format-14 python3 xvfb xauth)

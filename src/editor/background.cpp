@@ -1,40 +1,30 @@
 #include "editor/background.h"
 
+#include "editor/picture_file.h"
 #include "util/rounding.h"
 
 #include <QDir>
-#include <QFileInfo>
 
 #include <algorithm>
-#include <array>
 
 namespace {
 
 constexpr const char* kBlankPicture = "blank.gif";
 
-QImage loadPicture(const QString& path) {
-    return QImage(path).convertToFormat(QImage::Format_RGB32);
-}
-
-QImage blankPicture(const std::string& programFolder, Host& host) {
-    const QImage blank = loadPicture(QDir(QString::fromStdString(programFolder)).filePath(kBlankPicture));
+// number: of the place in the program, "" = none.
+QImage blankPicture(const std::string& programFolder, const std::string& number, Host& host) {
+    const QDir folder(QString::fromStdString(programFolder));
+    const QImage blank = loadPicture(folder.filePath(kBlankPicture).toStdString());
     if (!blank.isNull()) return blank;
     host.messageBox(boxTitle("-Preview Load Error"),
-                    "There was a problem loading the blank background.  Please contact support.", BoxIcon::Critical);
-    QImage white(1, 1, QImage::Format_RGB32);
-    white.fill(Qt::white);
-    return white;
+                    "There was a problem loading the blank background" + number + ".  Please contact support.",
+                    BoxIcon::Critical);
+    return whitePicture();
 }
 
-// In its own size.
-QImage backgroundPicture(const ZephSimulation& simulation, const std::string& programFolder, Host& host) {
-    if (simulation.Background.BackgroundType == kBackgroundPicture) {
-        const QImage picture = loadPicture(QString::fromStdString(backgroundPicturePath(simulation)));
-        if (!picture.isNull()) return picture;
-        host.messageBox(boxTitle("-Picture Load Error"),
-                        "An error occurred while trying to load the background graphic", BoxIcon::Critical);
-    }
-    return blankPicture(programFolder, host);
+QImage stretched(const QImage& picture, QSize size) {
+    if (picture.size() == size) return picture;
+    return picture.scaled(size, Qt::IgnoreAspectRatio, Qt::SmoothTransformation).convertToFormat(QImage::Format_RGB32);
 }
 
 }  // namespace
@@ -46,17 +36,21 @@ std::int32_t brightnessOffset(std::int32_t intensity) noexcept {
 }
 
 void ZephDrawFastBrightness(std::int32_t offset, QImage& picture) {
-    std::array<std::uint8_t, 256> table;
-    for (std::size_t byte = 0; byte < table.size(); ++byte) {
-        table[byte] = static_cast<std::uint8_t>(clampByte(static_cast<std::int32_t>(byte) + offset));
-    }
+    // Held to the bytes that stay one when the offset is added, in a form that the compiler turns into operations on
+    // whole registers of bytes: a look-up in a table would be one load a byte.
+    const std::int32_t held = std::clamp(offset, -255, 255);
+    const auto low = static_cast<std::uint8_t>(std::max(-held, 0));
+    const auto high = static_cast<std::uint8_t>(std::min(255 - held, 255));
+    const auto add = static_cast<std::uint8_t>(held & 0xFF);
+    const int width = picture.width();  // known to stay as it is while bytes are written
     for (int y = 0; y < picture.height(); ++y) {
-        QRgb* row = reinterpret_cast<QRgb*>(picture.scanLine(y));
-        for (int x = 0; x < picture.width(); ++x) {
-            const QRgb pixel = row[x];
-            row[x] = qRgb(table[static_cast<std::size_t>(qRed(pixel))], table[static_cast<std::size_t>(qGreen(pixel))],
-                          table[static_cast<std::size_t>(qBlue(pixel))]);
+        std::uint8_t* const bytes = picture.scanLine(y);
+        for (int n = 0; n < 4 * width; ++n) {
+            bytes[n] = static_cast<std::uint8_t>(std::min(std::max(bytes[n], low), high) + add);
         }
+        QRgb* const row = reinterpret_cast<QRgb*>(bytes);
+        for (int x = 0; x < width; ++x)
+            row[x] |= 0xFF000000;
     }
 }
 
@@ -65,29 +59,54 @@ QSize canvasSize(const ZephBackground& background) noexcept {
             std::clamp(heightPixels(background), 1, kMaxCanvasPixels)};
 }
 
-QImage ZephResizeAndSetBackgroundIntensity(const QImage& picture, const ZephBackground& background) {
-    const QSize canvas = canvasSize(background);
-    QImage stretched =
-        picture.size() == canvas ? picture : picture.scaled(canvas, Qt::IgnoreAspectRatio, Qt::SmoothTransformation);
-    stretched = stretched.convertToFormat(QImage::Format_RGB32);
-    if (background.PicIntensity != 100) ZephDrawFastBrightness(brightnessOffset(background.PicIntensity), stretched);
-    return stretched;
+QImage pictureAtIntensity(const QImage& Picture3, std::int32_t intensity) {
+    QImage dimmed = Picture3;
+    if (intensity != 100) ZephDrawFastBrightness(brightnessOffset(intensity), dimmed);
+    return dimmed;
 }
 
-std::string backgroundPicturePath(const ZephSimulation& simulation) {
-    const QString name = QString::fromStdString(simulation.Background.PicFileName);
-    if (QFileInfo(name).isAbsolute()) return name.toStdString();
-    return QDir(QString::fromStdString(simulation.FilePath)).filePath(name).toStdString();
+ZephBackgroundSurfaces ZephResizeAndSetBackgroundIntensity(const QImage& Image1, const ZephBackground& background) {
+    ZephBackgroundSurfaces surfaces;
+    surfaces.Picture3 = stretched(Image1, canvasSize(background));
+    surfaces.picBackground = pictureAtIntensity(surfaces.Picture3, background.PicIntensity);
+    return surfaces;
 }
 
-QImage ZephGLPicture(const ZephSimulation& simulation, const std::string& programFolder, Host& host) {
-    if (simulation.Background.BackgroundType != kBackgroundPicture) return {};
-    ZephBackground undimmed = simulation.Background;
-    undimmed.PicIntensity = 100;
-    return ZephResizeAndSetBackgroundIntensity(backgroundPicture(simulation, programFolder, host), undimmed);
+ZephBackgroundSurfaces loadBackground(const ZephSimulation& simulation, const std::string& programFolder,
+                                      BackgroundTexts texts, Host& host) {
+    const auto number = [&](const char* ofChange) {
+        return texts == BackgroundTexts::Change ? std::string(ofChange) : std::string();
+    };
+    if (simulation.Background.BackgroundType != kBackgroundPicture) {
+        return ZephResizeAndSetBackgroundIntensity(blankPicture(programFolder, number(" (002)"), host),
+                                                   simulation.Background);
+    }
+    QImage picture = loadPicture(ZephFindBackgroundPicture(simulation));
+    const bool failed = picture.isNull();
+    if (failed) {
+        host.messageBox(boxTitle("-Picture Load Error"),
+                        "An error occurred while trying to load the background graphic" + number(" (003)"),
+                        BoxIcon::Critical);
+        picture = blankPicture(programFolder, number(" (001)"), host);
+    }
+    ZephBackgroundSurfaces surfaces = ZephResizeAndSetBackgroundIntensity(picture, simulation.Background);
+    surfaces.pictureFailed = failed;
+    return surfaces;
 }
 
-QImage ZephResetBackground(const ZephSimulation& simulation, const std::string& programFolder, Host& host) {
-    return ZephResizeAndSetBackgroundIntensity(backgroundPicture(simulation, programFolder, host),
-                                               simulation.Background);
+ZephBackgroundSurfaces ZephResetBackground(const ZephSimulation& simulation, const std::string& programFolder,
+                                           Host& host) {
+    return loadBackground(simulation, programFolder, BackgroundTexts::Reset, host);
+}
+
+QImage whitePicture() {
+    QImage white(1, 1, QImage::Format_RGB32);
+    white.fill(Qt::white);
+    return white;
+}
+
+QImage previewPicture(const QImage& Image1, QSize canvas, QSize room) {
+    if (Image1.isNull() || room.isEmpty()) return {};
+    const QSize size = canvas.scaled(room, Qt::KeepAspectRatio).boundedTo(canvas).expandedTo({1, 1});
+    return stretched(Image1, size);
 }

@@ -1,5 +1,5 @@
-// The picture behind the display: found, loaded, stretched to the canvas and darkened. Made here without a window, for
-// the canvas, the simulation and the headless companion alike.
+// The picture behind the display: stretched to the canvas and darkened. Made here without a window, for the canvas,
+// the simulation and the headless companion alike.
 #pragma once
 
 #include "model/simulation.h"
@@ -8,6 +8,16 @@
 #include <QImage>
 
 #include <string>
+
+// The surfaces that a background is turned into, both of canvasSize and Format_RGB32.
+struct ZephBackgroundSurfaces {
+    QImage Picture3;             // the picture at its own brightness: what the OpenGL output dims by itself
+    QImage picBackground;        // the picture at PicIntensity
+    bool pictureFailed = false;  // a picture was wanted and could not be loaded
+};
+
+// Which texts tell that a picture failed: those of the background dialog end in a number.
+enum class BackgroundTexts { Reset, Change };
 
 // Brightness 0..100 as what is added to every byte of colour: floor((100 - intensity) x -2.55), 0..-255.
 std::int32_t brightnessOffset(std::int32_t intensity) noexcept;
@@ -18,17 +28,25 @@ void ZephDrawFastBrightness(std::int32_t offset, QImage& picture);
 // The canvas in pixels, each way held to 1..2500.
 QSize canvasSize(const ZephBackground& background) noexcept;
 
-// The picture stretched to the canvas of the background record at its PicIntensity: Format_RGB32, canvasSize.
-QImage ZephResizeAndSetBackgroundIntensity(const QImage& picture, const ZephBackground& background);
+// Picture3 at the intensity 0..100; at 100 they share their pixels.
+QImage pictureAtIntensity(const QImage& Picture3, std::int32_t intensity);
 
-// Where the picture of the document lies: a relative PicFileName lies beside the editor file, so that a display and
-// its picture travel together.
-std::string backgroundPicturePath(const ZephSimulation& simulation);
+// The picture in its own size stretched, not cropped, to the canvas of the record, and darkened to its PicIntensity.
+ZephBackgroundSurfaces ZephResizeAndSetBackgroundIntensity(const QImage& Image1, const ZephBackground& background);
 
-// The picture for the OpenGL output, which dims it by itself: stretched to the canvas at its own brightness. Null where
-// the background is no picture. One that cannot be loaded is told and replaced as below.
-QImage ZephGLPicture(const ZephSimulation& simulation, const std::string& programFolder, Host& host);
+// Loads the picture of the document, or the blank one of the program's folder, and makes the surfaces of it. A picture
+// that cannot be loaded is told in a box and the blank one takes its place; if that is missing too, another box, and
+// white.
+ZephBackgroundSurfaces loadBackground(const ZephSimulation& simulation, const std::string& programFolder,
+                                      BackgroundTexts texts, Host& host);
 
-// The background of a document just loaded or created, ready to draw on. A picture that cannot be loaded is told in a
-// box and the blank picture of the program's folder takes its place; if that is missing too, another box, and white.
-QImage ZephResetBackground(const ZephSimulation& simulation, const std::string& programFolder, Host& host);
+// The same for a document just loaded or created.
+ZephBackgroundSurfaces ZephResetBackground(const ZephSimulation& simulation, const std::string& programFolder,
+                                           Host& host);
+
+// What a canvas without a picture shows.
+QImage whitePicture();
+
+// What a dialog shows of a background: the canvas as large as it goes into the room, both in pixels, but no larger
+// than it is. Null where there is no picture.
+QImage previewPicture(const QImage& Image1, QSize canvas, QSize room);

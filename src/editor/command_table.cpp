@@ -18,7 +18,7 @@ constexpr std::array<CommandRow, kCommands> kRows{{
     {Debug, "mnuDebug", "", None, Menu, "&Debug", "", "", "", 0, 0, false, kBuilt},
     {Help, "mnuHelp", "", None, Menu, "&Help", "", "", "", 0, 0, false, kBuilt},
 
-    {FileNew, "mnuFileNew", "", File, Action, "&New...", "Ctrl+N", "New Simulation", "file-new", 1, 0},
+    {FileNew, "mnuFileNew", "", File, Action, "&New...", "Ctrl+N", "New Simulation", "file-new", 1, 0, false, kBuilt},
     {FileLoad, "mnuFileLoad", "", File, Action, "&Open...", "Ctrl+O", "Open Simulation", "file-open", 2, 0, false, kBuilt},
     {FileRecent, "mnuFileRecent", "", File, Menu, "Open &Recent", "", "", "", 0, 0, false, kBuilt},
     {FileSave, "mnuFileSave", "", File, Action, "&Save", "Ctrl+S", "Save Simulation", "file-save", 3, 0, kGap, kBuilt},
@@ -62,7 +62,7 @@ constexpr std::array<CommandRow, kCommands> kRows{{
     {DrawPixelWizard, "mnuDrawPixelWizard", "", Toolbox, Toggle, "Draw &Pixel Wizard...", "Ctrl+9", "Draw Pixel Wizard", "wizard-pixel", 0, 14},
     {SimulationMode, "mnuSimulationMode", "", Edit, Toggle, "Si&mulation Mode", "F5", "Simulation Mode", "simulate", 0, 1, false, kBuilt},
     {ObjectProperties, "mnuObjectProperties", "popObjectProperties", Edit, Action, "Fixture Properties", "Alt+Return", "Fixture Properties", "properties", 23, 0, kGap},
-    {BackgroundProperties, "mnuBackgroundProperties", "popBackgroundProperties", Edit, Action, "Back&ground Properties...", "Ctrl+B", "Background Properties", "background", 24, 0},
+    {BackgroundProperties, "mnuBackgroundProperties", "popBackgroundProperties", Edit, Action, "Back&ground Properties...", "Ctrl+B", "Background Properties", "background", 24, 0, false, kBuilt},
 
     {HelpAbout, "mnuHelpAbout", "", Help, Action, "&About...", "", "", "about", 0, 0, false, kBuilt},
 }};

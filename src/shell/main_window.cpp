@@ -53,7 +53,7 @@ void frmZephMain::setUpToolBars() {
 void frmZephMain::setUpMenus() {
     UpdateRecentFileMenu();
     CheckEnable(true);
-    CoolBar1_->band().show(ZephSetOptionsToolbandStuff(program_.settings, *program_.simulation));
+    showOptionsBand();
 }
 
 void frmZephMain::start() {
@@ -117,6 +117,7 @@ void frmZephMain::closeEvent(QCloseEvent* event) {
         event->ignore();
         return;
     }
+    takeIntensity();  // what is saved on leaving is what the slider shows
     const bool leave = Form_Unload(program_, *this, *this);
     event->setAccepted(leave);
     if (leave) QCoreApplication::quit();  // the OpenGL engine hides this window, so being hidden is no reason to quit
@@ -158,6 +159,10 @@ void frmZephMain::redrawObjects() {
 
 void frmZephMain::showDocument() {
     canvas_->scrollToOrigin();
+    showOptionsBand();
+}
+
+void frmZephMain::showOptionsBand() {
     CoolBar1_->band().show(ZephSetOptionsToolbandStuff(program_.settings, *program_.simulation));
 }
 

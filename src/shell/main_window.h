@@ -51,12 +51,14 @@ protected:
 private:
     // Commands
     void runCommand(Command command);
+    void mnuFileNew_Click();
     void mnuFileLoad_Click() override;
     void mnuRecentFiles_Click(int index) override;
     bool mnuFileSave_Click();  // true: the file was written
     void mnuFileSaveAs_Click();
     void mnuFileOptions_Click();
     void mnuFileExit_Click();
+    void mnuBackgroundProperties_Click();
     void mnuHelpAbout_Click();
     void cmdStop_MouseUp();
     void sldIntensity_Scroll();
@@ -108,6 +110,11 @@ private:
     void documentReplaced(bool backgroundChanged) override;
     // FileFace
     void showDocument() override;
+    void showOptionsBand() override;
+    std::optional<ZephNewSimulationChoice> showNewSimulation() override;
+    std::optional<ZephBackgroundDraft> showBackground(const ZephBackgroundDraft& draft,
+                                                      const BackgroundTerms& terms) override;
+    std::string findPicture(const std::string& missing) override;
     void setTitle(std::string_view windowTitle) override;
 
     void build();
@@ -123,6 +130,10 @@ private:
     KeyAnswer answerTo(const QKeyEvent& event) const;
     void carryOut(const KeyAnswer& answer);
     void moveListRow(bool backward);
+    // The brightness that sldIntensity shows becomes the document's, at once.
+    void takeIntensity();
+    // Where the file dialog looks for pictures first.
+    QString pictureFolder() const;
     void showContextMenu(const QPoint& globalPos);
     // Ends the simulation now, or behind the tick that is under way.
     void requestEnd();

@@ -1,5 +1,4 @@
 // The main window's commands: what menus, buttons, keys and the object list lead to, and showing what is available.
-#include "editor/background.h"
 #include "editor/insert_object.h"
 #include "editor/undo_commands.h"
 #include "shell/dialogs/about_dialog.h"
@@ -27,7 +26,11 @@ CommandInputs commandInputs(const Program& program) {
 }  // namespace
 
 void frmZephMain::runCommand(Command command) {
+    takeIntensity();  // no command, least of all a save, may find the slider ahead of the document
     switch (command) {
+    case Command::FileNew:
+        mnuFileNew_Click();
+        break;
     case Command::FileLoad:
         mnuFileLoad_Click();
         break;
@@ -63,6 +66,9 @@ void frmZephMain::runCommand(Command command) {
         break;
     case Command::SimulationMode:
         ::mnuSimulationMode_Click(program_, *this);
+        break;
+    case Command::BackgroundProperties:
+        mnuBackgroundProperties_Click();
         break;
     case Command::HelpAbout:
         mnuHelpAbout_Click();
@@ -138,7 +144,7 @@ void frmZephMain::mnuFileOptions_Click() {
     }
     ZephLoadUIObjectList();
     redrawObjects();
-    CoolBar1_->band().show(ZephSetOptionsToolbandStuff(program_.settings, *program_.simulation));
+    showOptionsBand();
     CheckEnable(false);
 }
 
@@ -154,28 +160,6 @@ void frmZephMain::mnuHelpAbout_Click() {
 void frmZephMain::cmdStop_MouseUp() {
     requestEnd();
 }
-
-void frmZephMain::sldIntensity_Scroll() {
-    tmrAdjustBrightness_.start();
-    program_.simulation->SimulationDirty = true;
-    host_.setStatusPanel(1, "Changed");
-}
-
-// The picture is made anew once the slider has stood still for a whole interval.
-void frmZephMain::tmrAdjustBrightness_Timer() try {
-    const int intensity = CoolBar1_->band().intensity();
-    if (intensity != lastIntensity_) {
-        lastIntensity_ = intensity;
-        return;
-    }
-    tmrAdjustBrightness_.stop();
-    if (!program_.simulation->SimulationOpen || program_.simulating()) return;
-    program_.simulation->Background.PicIntensity = intensity;
-    program_.picBackground =
-        ZephResetBackground(*program_.simulation, program_.seams.programFolder, program_.seams.host);
-    redrawObjects();
-}
-ZEPH_GUARD(program_.failures, kModule, )
 
 void frmZephMain::restoreIfMinimized() {
     if (isMinimized()) showNormal();

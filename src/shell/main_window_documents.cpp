@@ -13,6 +13,7 @@ EditContext frmZephMain::editContext() {
 }
 
 bool frmZephMain::mnuFileSave_Click() {
+    takeIntensity();  // the autosave comes here without a command
     const std::string now = createdAtNow();
     return ::mnuFileSave_Click({program_.files, now, *this}, *program_.simulation, program_.autosave);
 }
@@ -64,8 +65,7 @@ void frmZephMain::switchMode(int uiState) {
 void frmZephMain::documentReplaced(bool backgroundChanged) {
     ZephRebuildStaticFixtureBulbs(*program_.simulation, *program_.masks, *program_.bulbs);
     if (backgroundChanged) {
-        program_.picBackground =
-            ZephResetBackground(*program_.simulation, program_.seams.programFolder, program_.seams.host);
+        installBackground(ZephResetBackground(*program_.simulation, program_.seams.programFolder, host_), program_);
     }
     ZephLoadUIObjectList();
     redrawObjects();

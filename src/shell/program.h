@@ -57,7 +57,8 @@ struct Program {
     std::unique_ptr<ZephMasks> masks = std::make_unique<ZephMasks>();
     std::unique_ptr<ZephStaticBulbs> bulbs = std::make_unique<ZephStaticBulbs>();
 
-    QImage picBackground;  // the picture at canvas size and brightness; null = no canvas yet
+    QImage Picture3;       // the picture at canvas size and its own brightness; null = no canvas yet
+    QImage picBackground;  // the same at the brightness of the document
     QImage picBuffer;      // the editor's composed canvas
 
     std::unique_ptr<ZephFixtureStates> states = std::make_unique<ZephFixtureStates>();

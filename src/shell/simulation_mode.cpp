@@ -75,7 +75,8 @@ bool startOpenGLEngine(Program& program, SimulationFace& face) {
     GLTarget* const target = face.ZephCreateRenderWindow();
     if (!target) return false;
     host.setStatusPanel(2, "Start Rendering Cycle");
-    const QImage picture = ZephGLPicture(*program.simulation, program.seams.programFolder, host);
+    const bool hasPicture = program.simulation->Background.BackgroundType == kBackgroundPicture;
+    const QImage picture = hasPicture ? program.Picture3 : QImage();
     const QSize canvas = canvasSize(program.simulation->Background);
     const GLScene scene{*program.simulation,
                         program.tables,

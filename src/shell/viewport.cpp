@@ -54,7 +54,7 @@ CanvasViewport::CanvasViewport(QWidget* parent) : QWidget(parent) {
     picMain_ = new PictureBox(picViewport_);
     picMain_->setObjectName("picMain");
     picMain_->setContextMenuPolicy(Qt::CustomContextMenu);
-    hint_ = new QLabel(tr("Open a simulation to begin: File, Open"), picViewport_);
+    hint_ = new QLabel(tr("To begin, start a new simulation or open one: File, New or Open"), picViewport_);
     hint_->setForegroundRole(QPalette::PlaceholderText);
     hint_->adjustSize();
     HScroll1_ = new QScrollBar(Qt::Horizontal, this);

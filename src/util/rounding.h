@@ -50,6 +50,31 @@ constexpr std::int32_t divideHalfEven(std::int32_t dividend, std::int32_t diviso
     return quotient + (twice + (quotient & 1) > divisor ? 1 : 0);  // the odd neighbour tips a tie; no branch to guess
 }
 
+namespace rounding_detail {
+// floor(value x numerator / denominator) and what is left over, 0..denominator - 1. The denominator is above 0.
+struct Quotient {
+    std::int64_t whole;
+    std::int64_t rest;
+};
+constexpr Quotient scaled(std::int32_t value, std::int32_t numerator, std::int32_t denominator) noexcept {
+    const std::int64_t product = std::int64_t{value} * numerator;
+    std::int64_t whole = product / denominator;
+    if (product % denominator < 0) --whole;
+    return {whole, product - whole * denominator};
+}
+}  // namespace rounding_detail
+
+// value x numerator / denominator to the nearest whole number, in exact arithmetic: a tie to the even neighbour, or
+// upwards on the number line. The denominator is above 0.
+constexpr std::int32_t scaleHalfEven(std::int32_t value, std::int32_t numerator, std::int32_t denominator) noexcept {
+    const auto [whole, rest] = rounding_detail::scaled(value, numerator, denominator);
+    return saturate(whole + (2 * rest + (whole & 1) > denominator ? 1 : 0));
+}
+constexpr std::int32_t scaleHalfUp(std::int32_t value, std::int32_t numerator, std::int32_t denominator) noexcept {
+    const auto [whole, rest] = rounding_detail::scaled(value, numerator, denominator);
+    return saturate(whole + (2 * rest >= denominator ? 1 : 0));
+}
+
 // Intensity 0..100 to level 0..255, which is intensity x 2.55 in exact arithmetic: once cut off, once rounded.
 constexpr std::int32_t levelCut(std::int32_t intensity) noexcept {
     return intensity * 255 / 100;

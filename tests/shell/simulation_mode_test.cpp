@@ -37,6 +37,12 @@ public:
     void showPressedDrawButton() override {}
     void showModeButtons() override {}
     void showDocument() override {}
+    void showOptionsBand() override {}
+    std::optional<ZephNewSimulationChoice> showNewSimulation() override { return std::nullopt; }
+    std::optional<ZephBackgroundDraft> showBackground(const ZephBackgroundDraft&, const BackgroundTerms&) override {
+        return std::nullopt;
+    }
+    std::string findPicture(const std::string&) override { return {}; }
     void setTitle(std::string_view windowTitle) override { title = windowTitle; }
 
     bool timerOn = false;

@@ -134,7 +134,7 @@ TEST_F(WindowCommands, WithoutADocumentOnlyFilesAndHelpCanBeReached) {
         if (row.id == Command::None || row.kind == CommandKind::Menu) continue;
         if (find<QAction>(std::string(row.name).c_str())->isEnabled()) enabled.append(toQString(row.name));
     }
-    EXPECT_EQ(enabled, (QStringList{"mnuFileLoad", "mnuFileOptions", "mnuFileExit", "mnuHelpAbout"}));
+    EXPECT_EQ(enabled, (QStringList{"mnuFileNew", "mnuFileLoad", "mnuFileOptions", "mnuFileExit", "mnuHelpAbout"}));
     EXPECT_FALSE(find<QToolButton>("chkCmdFixtureOrProp(1)")->isEnabled());
     EXPECT_FALSE(find<QMenu>("mnuDebug")->menuAction()->isVisible());
     key(Qt::Key_F2);

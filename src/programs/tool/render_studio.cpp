@@ -20,7 +20,8 @@ public:
         ZephSetUpMasks(
             curve, [](std::string_view) {}, *masks_);
         ZephRebuildStaticFixtureBulbs(*document.simulation, *masks_, *bulbs_);
-        const QImage background = ZephResetBackground(*document.simulation, programFolder(), document.host);
+        const QImage background =
+            ZephResetBackground(*document.simulation, programFolder(), document.host).picBackground;
         return surface_.prepare({*document.simulation, display.tables, *display.states, *masks_, *bulbs_, background},
                                 document.failures);
     }
@@ -44,7 +45,9 @@ public:
         ToolDocument& document = *display.document;
         const auto shapes = std::make_unique<ZephGLShapes>();
         ZephGLCreateShapes(*shapes);
-        const QImage picture = ZephGLPicture(*document.simulation, programFolder(), document.host);
+        const bool hasPicture = document.simulation->Background.BackgroundType == kBackgroundPicture;
+        const QImage picture =
+            hasPicture ? ZephResetBackground(*document.simulation, programFolder(), document.host).Picture3 : QImage();
         return surface_.ZephGLStartup({*document.simulation, display.tables, *display.states, curve, *shapes, picture,
                                        document.simulation->Background.PicIntensity, size_.width(), size_.height()},
                                       target_, document.failures);

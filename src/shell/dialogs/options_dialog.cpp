@@ -1,27 +1,18 @@
 #include "shell/dialogs/options_dialog.h"
 
+#include "shell/dialogs/dialog_parts.h"
 #include "shell/dialogs/sample_view.h"
 
 #include <QCheckBox>
 #include <QComboBox>
-#include <QHBoxLayout>
-#include <QLabel>
 #include <QLineEdit>
-#include <QPushButton>
 #include <QTabWidget>
-#include <QVBoxLayout>
 
 namespace {
 
 constexpr int kFlashStepMs = 40;  // a step of the pixel flash speed
 constexpr const char* kDeadAddressStyle = "background: #a8322a; color: white; border-radius: 3px; padding: 3px 6px;";
 constexpr const char* kLiveAddressStyle = "padding: 3px 0;";
-
-QPushButton* button(const char* name, const QString& text) {
-    auto* made = new QPushButton(text);
-    made->setObjectName(name);
-    return made;
-}
 
 }  // namespace
 
@@ -49,20 +40,15 @@ frmZephOptions::frmZephOptions(ZephOptionsDraft draft, const ZephAdapters& adapt
 }
 
 QBoxLayout* frmZephOptions::buttonRow() {
-    QPushButton* cmdReset = button("cmdReset", tr("&Reset All..."));
-    QPushButton* cmdOK = button("cmdOK", tr("OK"));
-    QPushButton* cmdCancel = button("cmdCancel", tr("Cancel"));
-    cmdReset->setAutoDefault(false);
+    QPushButton* cmdReset = pushButton("cmdReset", tr("&Reset All..."));
+    QPushButton* cmdOK = pushButton("cmdOK", tr("OK"));
+    QPushButton* cmdCancel = pushButton("cmdCancel", tr("Cancel"));
     cmdReset->setToolTip(tr("Puts every option back to what it was when the program was installed"));
-    cmdOK->setDefault(true);
     connect(cmdReset, &QPushButton::clicked, this, &frmZephOptions::cmdReset_Click);
     connect(cmdOK, &QPushButton::clicked, this, &frmZephOptions::cmdOK_Click);
     connect(cmdCancel, &QPushButton::clicked, this, &QDialog::reject);
-    auto* row = new QHBoxLayout;
-    row->addWidget(cmdReset);
-    row->addStretch();
-    row->addWidget(cmdOK);
-    row->addWidget(cmdCancel);
+    QHBoxLayout* row = closingRow(cmdOK, cmdCancel);
+    row->insertWidget(0, cmdReset);
     return row;
 }
 

@@ -1,53 +1,26 @@
 // The six tabs of the options dialog: which control stands where, in which words.
+#include "shell/dialogs/dialog_parts.h"
+#include "shell/dialogs/number_field.h"
 #include "shell/dialogs/options_dialog.h"
 #include "shell/dialogs/sample_view.h"
 
 #include <QCheckBox>
 #include <QComboBox>
-#include <QFormLayout>
 #include <QGridLayout>
-#include <QGroupBox>
-#include <QLabel>
 #include <QLineEdit>
 #include <QSlider>
 #include <QSpinBox>
 #include <QVBoxLayout>
-#include <QValidator>
 
 namespace {
 
-constexpr int kGapPx = 12;          // between the groups of a tab
 constexpr int kFieldWidthPx = 110;  // of lists that hold a number
-
-// Keeps everything but digits out of a field, be it typed or pasted.
-class DigitsOnly : public QValidator {
-public:
-    using QValidator::QValidator;
-    State validate(QString& input, int&) const override {
-        const auto digit = [](QChar letter) { return IsValidDigitKey(letter.unicode()); };
-        return std::ranges::all_of(input, digit) ? Acceptable : Invalid;
-    }
-};
-
-QGroupBox* group(const QString& title, QLayout* inside) {
-    auto* box = new QGroupBox(title);
-    box->setLayout(inside);
-    return box;
-}
 
 QVBoxLayout* column(std::initializer_list<QWidget*> widgets) {
     auto* layout = new QVBoxLayout;
     for (QWidget* widget : widgets)
         layout->addWidget(widget);
     layout->addStretch();
-    return layout;
-}
-
-QFormLayout* form() {
-    auto* layout = new QFormLayout;
-    layout->setLabelAlignment(Qt::AlignLeft | Qt::AlignVCenter);
-    layout->setFieldGrowthPolicy(QFormLayout::FieldsStayAtSizeHint);
-    layout->setHorizontalSpacing(kGapPx);
     return layout;
 }
 
@@ -62,8 +35,8 @@ Field* addRow(QFormLayout& layout, const QString& label, Field* field) {
 // Groups side by side share a row of the grid.
 QWidget* tab(QGridLayout* grid) {
     auto* page = new QWidget;
-    grid->setContentsMargins(kGapPx, kGapPx, kGapPx, kGapPx);
-    grid->setSpacing(kGapPx);
+    grid->setContentsMargins(kDialogGapPx, kDialogGapPx, kDialogGapPx, kDialogGapPx);
+    grid->setSpacing(kDialogGapPx);
     page->setLayout(grid);
     return page;
 }
@@ -88,7 +61,7 @@ QWidget* frmZephOptions::tooltipsTab() {
     fixtures->addWidget(make.check("chkTTLock", tr("Lock"), &ZephSettings::ToolTipsLock), 1, 1);
     fixtures->addWidget(make.check("chkTTSize", tr("Bulb shape and size"), &ZephSettings::ToolTipsSize), 2, 1);
     fixtures->addWidget(make.check("chkTTOpacity", tr("Opacity"), &ZephSettings::ToolTipsOpacity), 3, 1);
-    auto* channels = form();
+    auto* channels = labelledForm();
     addRow(*channels, tr("&Channels listed:"),
            make.list("cmbTTNumberOfChannels", &ZephSettings::ToolTipsNumAsgnChannels));
     fixtures->addLayout(channels, 5, 0, 1, 2);
@@ -97,7 +70,7 @@ QWidget* frmZephOptions::tooltipsTab() {
     QVBoxLayout* props = column({make.check("chkTTPropName", tr("Name"), &ZephSettings::ToolTipsPropName),
                                  make.check("chkTTPropLock", tr("Lock"), &ZephSettings::ToolTipsPropLock),
                                  make.check("chkTTPropComment", tr("Comment"), &ZephSettings::ToolTipsPropComment)});
-    auto* members = form();
+    auto* members = labelledForm();
     addRow(*members, tr("F&ixtures listed:"),
            make.list("cmbTTNumberOfFixtures", &ZephSettings::ToolTipsNumAsgnFixtures));
     props->insertLayout(3, members);
@@ -123,9 +96,9 @@ QWidget* frmZephOptions::tooltipsTab() {
     flash->addWidget(sldPixelFlashSpeed, 1);
     flash->addWidget(lblPixelFlashSpeed_);
 
-    QGroupBox* fixtureGroup = group(tr("About a fixture"), fixtures);
-    QGroupBox* propGroup = group(tr("About a prop"), props);
-    QGroupBox* ribbonGroup = group(tr("About ribbons and pixels"), ribbons);
+    QGroupBox* fixtureGroup = groupBox(tr("About a fixture"), fixtures);
+    QGroupBox* propGroup = groupBox(tr("About a prop"), props);
+    QGroupBox* ribbonGroup = groupBox(tr("About ribbons and pixels"), ribbons);
     for (QWidget* dependent : std::initializer_list<QWidget*>{chkAlways, fixtureGroup, propGroup, ribbonGroup})
         connect(chkShow, &QCheckBox::toggled, dependent, &QWidget::setEnabled);
 
@@ -135,7 +108,7 @@ QWidget* frmZephOptions::tooltipsTab() {
     grid->addWidget(fixtureGroup, 2, 0, 2, 1);
     grid->addWidget(propGroup, 2, 1);
     grid->addWidget(ribbonGroup, 3, 1);
-    grid->addWidget(group(tr("Order of pixels, shown with the Shift key down"), flash), 4, 0, 1, 2);
+    grid->addWidget(groupBox(tr("Order of pixels, shown with the Shift key down"), flash), 4, 0, 1, 2);
     grid->setColumnStretch(0, 3);
     grid->setColumnStretch(1, 2);
     grid->setRowStretch(3, 1);
@@ -144,7 +117,7 @@ QWidget* frmZephOptions::tooltipsTab() {
 
 QWidget* frmZephOptions::generalTab() {
     OptionControls& make = controls_;
-    auto* files = form();
+    auto* files = labelledForm();
     addRow(*files, tr("When the program s&tarts:"), make.list("cmbStartupOption", &ZephSettings::OnStartup));
     addRow(*files, tr("&Save automatically after:"), make.list("cmbAutoSave", &ZephSettings::AutoSave));
     files->addRow(make.check("chkCheckFileExtension", tr("Check the e&xtension of files"),
@@ -157,7 +130,7 @@ QWidget* frmZephOptions::generalTab() {
                     &ZephSettings::EndStopsSimulation)});
 
     auto* display = new QGridLayout;
-    auto* names = form();
+    auto* names = labelledForm();
     addRow(*names, tr("Show a fixture's &name at:"),
            make.list("cmbShowFixtureName", &ZephSettings::FixtureTextLocation));
     display->addLayout(names, 0, 0, 1, 2);
@@ -180,9 +153,9 @@ QWidget* frmZephOptions::generalTab() {
     display->setColumnStretch(1, 1);
 
     auto* grid = new QGridLayout;
-    grid->addWidget(group(tr("Files"), files), 0, 0);
-    grid->addWidget(group(tr("Editing"), editing), 1, 0);
-    grid->addWidget(group(tr("Display"), display), 2, 0);
+    grid->addWidget(groupBox(tr("Files"), files), 0, 0);
+    grid->addWidget(groupBox(tr("Editing"), editing), 1, 0);
+    grid->addWidget(groupBox(tr("Display"), display), 2, 0);
     grid->setRowStretch(3, 1);
     return tab(grid);
 }
@@ -196,16 +169,16 @@ QWidget* frmZephOptions::colorsTab() {
                                     &ZephSettings::SampleRGBColor, sampleChanged);
     picSample_ = new SampleView;
     picSample_->setObjectName("picSample");
-    auto* sampleColors = form();
+    auto* sampleColors = labelledForm();
     addRow(*sampleColors, tr("&Background:"), cmdSampleBackgroundColor_);
     addRow(*sampleColors, tr("RGB fi&xtures:"), cmdSampleRGBColor_);
     auto* sample = new QHBoxLayout;
-    sample->setSpacing(2 * kGapPx);
+    sample->setSpacing(2 * kDialogGapPx);
     sample->addLayout(sampleColors);
     sample->setAlignment(sampleColors, Qt::AlignTop);
     sample->addWidget(picSample_, 1);
 
-    auto* colors = form();
+    auto* colors = labelledForm();
     addRow(*colors, tr("&Names of fixtures:"),
            make.color("cmdFixtureTextColor", tr("Names of Fixtures"), &ZephSettings::FixtureTextColor));
     addRow(*colors, tr("&Tool handles:"),
@@ -215,8 +188,8 @@ QWidget* frmZephOptions::colorsTab() {
     addRow(*colors, tr("&Grid lines:"), make.color("cmdGridLineColor", tr("Grid Lines"), &ZephSettings::GridColor));
 
     auto* grid = new QGridLayout;
-    grid->addWidget(group(tr("Sample of a new fixture"), sample), 0, 0);
-    grid->addWidget(group(tr("Colors of the editor"), colors), 1, 0);
+    grid->addWidget(groupBox(tr("Sample of a new fixture"), sample), 0, 0);
+    grid->addWidget(groupBox(tr("Colors of the editor"), colors), 1, 0);
     grid->setRowStretch(2, 1);
     return tab(grid);
 }
@@ -226,7 +199,7 @@ QWidget* frmZephOptions::newFixturesTab() {
     cmbAssumeNewObject_ = new QComboBox;
     cmbAssumeNewObject_->setObjectName("cmbAssumeNewObject");
     fillList(*cmbAssumeNewObject_, ZephAssumeNewObjectItems());
-    auto* objects = form();
+    auto* objects = labelledForm();
     addRow(*objects, tr("A drawing makes a &new fixture:"), cmbAssumeNewObject_);
     addRow(*objects, tr("Its channels are of &type:"),
            make.list("cmbDefaultChannelType", &ZephSettings::DefaultChannelType));
@@ -261,16 +234,16 @@ QWidget* frmZephOptions::newFixturesTab() {
                            &ZephSettings::ChannelDefaultRGBColor)});
 
     auto* grid = new QGridLayout;
-    grid->addWidget(group(tr("New fixtures"), objects), 0, 0);
-    grid->addWidget(group(tr("Open the properties after"), properties), 1, 0);
-    grid->addWidget(group(tr("A new channel's name is made of"), names), 2, 0);
+    grid->addWidget(groupBox(tr("New fixtures"), objects), 0, 0);
+    grid->addWidget(groupBox(tr("Open the properties after"), properties), 1, 0);
+    grid->addWidget(groupBox(tr("A new channel's name is made of"), names), 2, 0);
     grid->setRowStretch(3, 1);
     return tab(grid);
 }
 
 QWidget* frmZephOptions::bulbsTab() {
     OptionControls& make = controls_;
-    auto* bulbs = form();
+    auto* bulbs = labelledForm();
     addRow(*bulbs, tr("&Size of bulbs:"), make.list("cmbBulbSize", &ZephSettings::BulbSize));
     addRow(*bulbs, tr("S&pacing of bulbs:"), make.list("cmbBulbSpacing", &ZephSettings::BulbSpacing));
     addRow(*bulbs, tr("S&hape of bulbs:"), make.list("cmbBulbShape", &ZephSettings::BulbShape));
@@ -278,7 +251,7 @@ QWidget* frmZephOptions::bulbsTab() {
         addRow(*bulbs, tr("Shape on ribbons:"), make.list("cmbKeshBulbShape", &ZephSettings::KeshBulbShape));
     cmbKeshBulbShape->setEnabled(false);
     cmbKeshBulbShape->setToolTip(tr("Ribbons always show the pixel bulb"));
-    auto* floods = form();
+    auto* floods = labelledForm();
     addRow(*floods, tr("Size of &floods:"), make.list("cmbFloodSize", &ZephSettings::FloodSize));
     addRow(*floods, tr("&Opacity of floods:"), make.list("cmbMaxOpacity", &ZephSettings::FloodOpacity));
     addRow(*floods, tr("&Level:"), make.list("cmbZOrder", &ZephSettings::ZOrder));
@@ -296,8 +269,8 @@ QWidget* frmZephOptions::bulbsTab() {
                     tr("Kept for other versions of the program; this one never warns of it"))});
 
     auto* grid = new QGridLayout;
-    grid->addWidget(group(tr("What new fixtures begin with"), defaults), 0, 0);
-    grid->addWidget(group(tr("Do not warn of"), warnings), 1, 0);
+    grid->addWidget(groupBox(tr("What new fixtures begin with"), defaults), 0, 0);
+    grid->addWidget(groupBox(tr("Do not warn of"), warnings), 1, 0);
     grid->setRowStretch(2, 1);
     return tab(grid);
 }
@@ -319,13 +292,13 @@ QWidget* frmZephOptions::communicationsTab() {
     lblLocalIP_->setTextInteractionFlags(Qt::TextSelectableByMouse);
     chkUseTCP_ = new QCheckBox(tr("Receive over &TCP until the program ends; it starts with UDP"));
     chkUseTCP_->setObjectName("chkUseTCP");
-    auto* link = form();
+    auto* link = labelledForm();
     addRow(*link, tr("Simulation &port:"), txtZephPort_);
     addRow(*link, tr("Network &adapter:"), cmbAdapter_);
     link->addRow(QString(), lblLocalIP_);
     link->addRow(QString(), chkUseTCP_);
 
-    auto* rendering = form();
+    auto* rendering = labelledForm();
     rendering->addRow(make.check("chkAdvancedRendering", tr("Use the ad&vanced render engine (OpenGL)"),
                                  &ZephSettings::AdvancedRenderEngine));
     rendering->addRow(make.check("chkForceForward", tr("Bring the simulation to the &front when a sequence starts"),
@@ -339,9 +312,9 @@ QWidget* frmZephOptions::communicationsTab() {
                            &ZephSettings::ReferenceFileWarning)});
 
     auto* grid = new QGridLayout;
-    grid->addWidget(group(tr("Data link"), link), 0, 0);
-    grid->addWidget(group(tr("Simulation"), rendering), 1, 0);
-    grid->addWidget(group(tr("References"), references), 2, 0);
+    grid->addWidget(groupBox(tr("Data link"), link), 0, 0);
+    grid->addWidget(groupBox(tr("Simulation"), rendering), 1, 0);
+    grid->addWidget(groupBox(tr("References"), references), 2, 0);
     grid->setRowStretch(3, 1);
     return tab(grid);
 }
