@@ -2,7 +2,6 @@
 
 #include "engine/bulb_walk.h"
 #include "engine/item_sort.h"
-#include "engine/paint_order.h"
 #include "engine/pixel_store.h"
 
 #include <algorithm>
@@ -18,21 +17,17 @@ public:
                 const ZephMasks& masks, const ZephStaticBulbs& bulbs, FramePlan& plan)
         : document_(document), tables_(tables), states_(states), masks_(masks), bulbs_(bulbs), plan_(plan) {
         plan_.Units.resize(1);
-        plan_.UnitOfChannel.assign(kChannelSlots, 0);
-        plan_.UnitOfGroup.assign(tables.RGBData.size(), 0);
     }
 
     void addAll() {
-        forEachUnitPainted(
+        numberUnitsPainted(
             tables_, [&](std::int32_t fixture, std::int32_t channel) { addChannel(fixture, channel); },
-            [&](std::int32_t fixture, std::int32_t rgbIndex) { addGroup(fixture, rgbIndex); });
+            [&](std::int32_t fixture) { addGroup(fixture); }, plan_.NumberOf);
     }
 
 private:
     void addChannel(std::int32_t fixture, std::int32_t channel) {
-        std::int32_t& number = plan_.UnitOfChannel[channelSlot(fixture, channel)];
-        if (number != 0) return;
-        number = addUnit(fixture, channel);
+        const std::int32_t number = addUnit(fixture, channel);
         const ZephFixture& record = document_.Fixtures[fixture];
         const std::int32_t subType = record.Channels[channel].Sub_Type;
         if (subType < kSpecialNone || subType > kSpecialMultiColor) return;  // a special type that is not drawn
@@ -49,10 +44,8 @@ private:
         if (subType == kSpecialStrobes) plan_.ListedBulbs += unit.BulbCount;
     }
 
-    void addGroup(std::int32_t fixture, std::int32_t rgbIndex) {
-        std::int32_t& number = plan_.UnitOfGroup.at(static_cast<std::size_t>(rgbIndex));
-        if (number != 0) return;
-        number = addUnit(fixture, 0);
+    void addGroup(std::int32_t fixture) {
+        const std::int32_t number = addUnit(fixture, 0);
         const ZephFixture& record = document_.Fixtures[fixture];
         ++plan_.Groups;
         if (record.Fixture_Type == kFixtureFlood) {

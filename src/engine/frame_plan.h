@@ -5,6 +5,7 @@
 #include "engine/blend.h"
 #include "engine/bulb_images.h"
 #include "engine/fixture_state.h"
+#include "engine/paint_order.h"
 #include "engine/render_table.h"
 
 #include <algorithm>
@@ -41,8 +42,7 @@ struct FramePlan {
     std::int32_t TileWidth = 0;               // pixels, whole cache lines
     std::int32_t TileColumns = 0;             // tiles of a band; tile number = band x TileColumns + column, from 0
     std::vector<PlanUnit> Units;              // [0] not used, draws nothing
-    std::vector<std::int32_t> UnitOfChannel;  // [fixture x (kMaxChannels + 1) + channel], 0 = none
-    std::vector<std::int32_t> UnitOfGroup;    // [RGBIndex], 0 = none
+    UnitNumbers NumberOf;                     // into Units
     std::vector<std::int32_t> SpriteOf;       // into Sprites, by unit
     std::vector<BulbSprite> Sprites;          // those of groups change from frame to frame, the others are shared
     std::vector<BulbItem> Items;              // by unit

@@ -1,7 +1,6 @@
 #include "engine/gl_plan.h"
 
 #include "engine/bulb_walk.h"
-#include "engine/paint_order.h"
 #include "util/failure.h"
 
 #include <array>
@@ -18,20 +17,16 @@ public:
                   const ZephGLShapes& shapes, GLPlan& plan)
         : document_(document), tables_(tables), states_(states), shapes_(shapes), plan_(plan) {
         plan_.Units.resize(1);
-        plan_.UnitOfChannel.assign(kChannelSlots, 0);
-        plan_.UnitOfGroup.assign(tables.RGBData.size(), 0);
     }
 
     void addAll() {
-        forEachUnitPainted(
+        numberUnitsPainted(
             tables_, [&](std::int32_t fixture, std::int32_t channel) { addChannel(fixture, channel); },
-            [&](std::int32_t fixture, std::int32_t rgbIndex) { addGroup(fixture, rgbIndex); });
+            [&](std::int32_t fixture) { addGroup(fixture); }, plan_.NumberOf);
     }
 
 private:
     void addChannel(std::int32_t fixture, std::int32_t channel) {
-        std::int32_t& number = plan_.UnitOfChannel[channelSlot(fixture, channel)];
-        if (number != 0) return;
         const ZephChannel& record = document_.Fixtures[fixture].Channels[channel];
         GLPlanUnit unit = newUnit(fixture, channel);
         switch (record.Sub_Type) {
@@ -49,12 +44,10 @@ private:
         default:
             unit.Shape = -1;  // a special type that is not drawn
         }
-        number = addUnit(unit);
+        addUnit(unit);
     }
 
-    void addGroup(std::int32_t fixture, std::int32_t rgbIndex) {
-        std::int32_t& number = plan_.UnitOfGroup.at(static_cast<std::size_t>(rgbIndex));
-        if (number != 0) return;
+    void addGroup(std::int32_t fixture) {
         GLPlanUnit unit = newUnit(fixture, 1);
         const std::int32_t type = document_.Fixtures[fixture].Fixture_Type;
         if (type == kFixtureKesh || type == kFixtureDmxPixels) {
@@ -65,7 +58,7 @@ private:
         } else {
             plan_.SlotColors.push_back(0);
         }
-        number = addUnit(unit);
+        addUnit(unit);
     }
 
     static std::uint32_t packed(std::int32_t color) noexcept {
@@ -85,7 +78,7 @@ private:
     }
 
     // Files the unit, with the triangles of its bulbs if it has slots for their colours.
-    std::int32_t addUnit(GLPlanUnit unit) {
+    void addUnit(GLPlanUnit unit) {
         unit.SlotCount = static_cast<std::int32_t>(plan_.SlotColors.size()) - unit.FirstSlot;
         unit.FirstIndex = static_cast<std::int32_t>(plan_.Indices.size());
         if (unit.Shape >= 0 && unit.SlotCount > 0) {
@@ -100,7 +93,6 @@ private:
         }
         unit.IndexCount = static_cast<std::int32_t>(plan_.Indices.size()) - unit.FirstIndex;
         plan_.Units.push_back(unit);
-        return static_cast<std::int32_t>(plan_.Units.size() - 1);
     }
 
     void addBulb(const GLFill& fill, const ZephBulbLocation& bulb, std::uint32_t slot) {

@@ -4,6 +4,7 @@
 
 #include "engine/fixture_state.h"
 #include "engine/gl_shapes.h"
+#include "engine/paint_order.h"
 #include "engine/render_table.h"
 
 #include <cstdint>
@@ -40,9 +41,8 @@ struct GLPlanUnit {
 };
 
 struct GLPlan {
-    std::vector<GLPlanUnit> Units;            // [0] not used
-    std::vector<std::int32_t> UnitOfChannel;  // [channelSlot], 0 = none
-    std::vector<std::int32_t> UnitOfGroup;    // [RGBIndex], 0 = none
+    std::vector<GLPlanUnit> Units;  // [0] not used
+    UnitNumbers NumberOf;           // into Units
     std::vector<GLVertex> Vertices;
     std::vector<std::uint32_t> Indices;  // three a triangle, into Vertices, by unit
     std::vector<std::uint32_t>

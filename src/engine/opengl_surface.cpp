@@ -1,6 +1,5 @@
 #include "engine/opengl_surface.h"
 
-#include "engine/paint_order.h"
 #include "util/rounding.h"
 
 #include <algorithm>
@@ -101,15 +100,16 @@ void OpenGLSurface::drawChannel(const ChannelDraw& draw) {
     if (fixture.Fixture_Type == kFixtureFlood && draw.Alpha > fixture.Max_Opacity) {
         alpha = (*curve_)[static_cast<std::size_t>(levelCut(std::clamp(fixture.Max_Opacity, 0, 100)))];
     }
-    if (alpha != 0) lightUnit(plan_.UnitOfChannel[channelSlot(draw.Fixture, draw.Channel)], draw.BulbLit, alpha << 24);
+    if (alpha != 0)
+        lightUnit(plan_.NumberOf.OfChannel[channelSlot(draw.Fixture, draw.Channel)], draw.BulbLit, alpha << 24);
 }
 
 void OpenGLSurface::drawGroup(const GroupDraw& draw, ZephRGBData&) {
     if (!current_ || draw.Alpha == 0 || draw.RGBIndex < 1 ||
-        static_cast<std::size_t>(draw.RGBIndex) >= plan_.UnitOfGroup.size()) {
+        static_cast<std::size_t>(draw.RGBIndex) >= plan_.NumberOf.OfGroup.size()) {
         return;
     }
-    const std::int32_t number = plan_.UnitOfGroup[static_cast<std::size_t>(draw.RGBIndex)];
+    const std::int32_t number = plan_.NumberOf.OfGroup[static_cast<std::size_t>(draw.RGBIndex)];
     const std::uint32_t color =
         (static_cast<std::uint32_t>(draw.Color) & static_cast<std::uint32_t>(kWhite)) | std::uint32_t{draw.Alpha} << 24;
     if (draw.Bulbs == nullptr) {

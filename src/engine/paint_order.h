@@ -4,6 +4,7 @@
 #include "engine/render_table.h"
 
 #include <cstdint>
+#include <vector>
 
 // Place of a channel in an array by fixture 1..1024 and channel 1..16.
 constexpr std::size_t channelSlot(std::int32_t fixture, std::int32_t channel) noexcept {
@@ -11,11 +12,25 @@ constexpr std::size_t channelSlot(std::int32_t fixture, std::int32_t channel) no
 }
 inline constexpr std::size_t kChannelSlots = channelSlot(kMaxFixtures + 1, 0);
 
-// Level by level in table order, the plain channels of a level before its RGB groups, as the render cycle calls for
-// them: visitChannel(fixture, channel), visitGroup(fixture, rgbIndex). A group is visited once for each of its colours;
-// numbers that no fixture or channel has are left out.
-template <typename VisitChannel, typename VisitGroup>
-void forEachUnitPainted(const ZephRenderTables& tables, VisitChannel visitChannel, VisitGroup visitGroup) {
+// The units of a plan, numbered from 1 in the order of painting; 0 = none.
+struct UnitNumbers {
+    std::vector<std::int32_t> OfChannel;  // [channelSlot]
+    std::vector<std::int32_t> OfGroup;    // [RGBIndex]
+};
+
+// Numbers the units level by level in table order, the plain channels of a level before its RGB groups, as the render
+// cycle calls for them, and calls addChannel(fixture, channel) or addGroup(fixture) for each as it gets its
+// number. Numbers that no fixture or channel has are left out.
+template <typename AddChannel, typename AddGroup>
+void numberUnitsPainted(const ZephRenderTables& tables, AddChannel addChannel, AddGroup addGroup, UnitNumbers& units) {
+    units.OfChannel.assign(kChannelSlots, 0);
+    units.OfGroup.assign(tables.RGBData.size(), 0);
+    std::int32_t count = 0;
+    const auto isNew = [&](std::int32_t& number) {
+        if (number != 0) return false;
+        number = ++count;
+        return true;
+    };
     const auto forEachSlot = [&](std::int32_t level, auto visit) {
         for (const ZephRenderData& entry : tables.RenderData) {
             if ((entry.LevelUsed >> level & 1U) == 0) continue;
@@ -28,10 +43,13 @@ void forEachUnitPainted(const ZephRenderTables& tables, VisitChannel visitChanne
     for (std::int32_t level = 1; level <= kLevels; ++level) {
         forEachSlot(level, [&](const ZephRenderSlot& slot) {
             const bool plain = !slot.isRGB() && slot.KeshMagic == 0;
-            if (plain && slot.Channel >= 1 && slot.Channel <= kMaxChannels) visitChannel(slot.Fixture, slot.Channel);
+            if (!plain || slot.Channel < 1 || slot.Channel > kMaxChannels) return;
+            if (isNew(units.OfChannel[channelSlot(slot.Fixture, slot.Channel)])) addChannel(slot.Fixture, slot.Channel);
         });
         forEachSlot(level, [&](const ZephRenderSlot& slot) {
-            if (slot.isRGB()) visitGroup(slot.Fixture, slot.RGBIndex);
+            if (!slot.isRGB()) return;
+            // A group has a slot for each of its colours.
+            if (isNew(units.OfGroup.at(static_cast<std::size_t>(slot.RGBIndex)))) addGroup(slot.Fixture);
         });
     }
 }

@@ -1,7 +1,5 @@
 #include "engine/standard_surface.h"
 
-#include "engine/paint_order.h"
-
 #include <algorithm>
 
 namespace {
@@ -144,7 +142,7 @@ void StandardSurface::drawChannel(const ChannelDraw& draw) {
         draw.Channel < 1 || draw.Channel > kMaxChannels) {
         return;
     }
-    const std::int32_t unit = plan_.UnitOfChannel[channelSlot(draw.Fixture, draw.Channel)];
+    const std::int32_t unit = plan_.NumberOf.OfChannel[channelSlot(draw.Fixture, draw.Channel)];
     const PlanUnit& planned = plan_.Units[static_cast<std::size_t>(unit)];
     if (planned.SpriteCount == 0) return;
     noteUnit(unit, draw.Alpha);
@@ -159,10 +157,10 @@ void StandardSurface::drawChannel(const ChannelDraw& draw) {
 
 void StandardSurface::drawGroup(const GroupDraw& draw, ZephRGBData& group) {
     if (!scene_ || draw.Alpha == 0 || draw.RGBIndex < 1 ||
-        static_cast<std::size_t>(draw.RGBIndex) >= plan_.UnitOfGroup.size()) {
+        static_cast<std::size_t>(draw.RGBIndex) >= plan_.NumberOf.OfGroup.size()) {
         return;
     }
-    const std::int32_t unit = plan_.UnitOfGroup[static_cast<std::size_t>(draw.RGBIndex)];
+    const std::int32_t unit = plan_.NumberOf.OfGroup[static_cast<std::size_t>(draw.RGBIndex)];
     const PlanUnit& planned = plan_.Units[static_cast<std::size_t>(unit)];
     if (planned.SpriteCount == 0 || (draw.Bulbs != nullptr && draw.BulbCount == 0)) return;
 

@@ -7,7 +7,7 @@
 namespace {
 
 const GLPlanUnit& unitOf(const GLPlan& plan, std::int32_t fixture, std::int32_t channel) {
-    return plan.Units[static_cast<std::size_t>(plan.UnitOfChannel[channelSlot(fixture, channel)])];
+    return plan.Units[static_cast<std::size_t>(plan.NumberOf.OfChannel[channelSlot(fixture, channel)])];
 }
 
 std::uint32_t slotOf(const GLPlan& plan, std::int32_t index) {
@@ -39,8 +39,8 @@ TEST(GLPlan, LaysTrianglesOutInTheOrderOfPainting) {
 
     // Level 1: the channel of fixture 3, then the group of fixture 2; level 3: fixture 1. A square has 6 indices.
     EXPECT_EQ(unitOf(plan, 3, 1).FirstIndex, 0);
-    EXPECT_EQ(plan.Units[static_cast<std::size_t>(plan.UnitOfGroup[1])].FirstIndex, 6);
-    EXPECT_EQ(plan.Units[static_cast<std::size_t>(plan.UnitOfGroup[1])].IndexCount, 12);
+    EXPECT_EQ(plan.Units[static_cast<std::size_t>(plan.NumberOf.OfGroup[1])].FirstIndex, 6);
+    EXPECT_EQ(plan.Units[static_cast<std::size_t>(plan.NumberOf.OfGroup[1])].IndexCount, 12);
     EXPECT_EQ(unitOf(plan, 1, 1).FirstIndex, 18);
     EXPECT_EQ(plan.SlotColors, (std::vector<std::uint32_t>{0x070809, 0, 0}));
     const GLVertex& corner = plan.Vertices[plan.Indices[0]];
@@ -84,7 +84,7 @@ TEST(GLPlan, LeavesBulbsOutThatAreNotDrawn) {
     EXPECT_EQ(unitOf(plan, 1, 1).IndexCount, 12);
     EXPECT_EQ(unitOf(plan, 2, 1).IndexCount, 0);
     EXPECT_EQ(plan.ListedBulbs, 4);  // counted once, though each pixel has a group
-    const GLPlanUnit& pixel = plan.Units[static_cast<std::size_t>(plan.UnitOfGroup[1])];
+    const GLPlanUnit& pixel = plan.Units[static_cast<std::size_t>(plan.NumberOf.OfGroup[1])];
     EXPECT_EQ(pixel.IndexCount, 0);
     EXPECT_GE(pixel.Shape, 0);
 }
