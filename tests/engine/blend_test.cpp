@@ -1,10 +1,7 @@
 #include "engine/blend.h"
 #include "util/random_source.h"
 
-#include <gtest/gtest.h>
-
 #include <cmath>
-#include <vector>
 
 namespace {
 

@@ -1,20 +1,10 @@
 #include "engine/gl_shapes.h"
-
-#include <gtest/gtest.h>
-
-#include <array>
-#include <memory>
-#include <set>
+#include "tests/support/masks.h"
 
 namespace {
 
 const ZephGLShapes& shapes() {
-    static const std::unique_ptr<ZephGLShapes> made = [] {
-        auto all = std::make_unique<ZephGLShapes>();
-        ZephGLCreateShapes(*all);
-        return all;
-    }();
-    return *made;
+    return masks().GLShapes;
 }
 
 std::int32_t doubleArea(const ShapeVertex& a, const ShapeVertex& b, const ShapeVertex& c) {

@@ -2,8 +2,6 @@
 #include "shell/simulation_mode.h"
 #include "tests/shell/shell_rig.h"
 
-#include <gmock/gmock.h>
-
 namespace {
 
 class RecordingFace : public SimulationFace, public FileFace {
