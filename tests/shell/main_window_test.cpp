@@ -1,40 +1,24 @@
 #include "engine/dialogs/compile_errors_dialog.h"
-#include "shell/main_window.h"
-#include "tests/shell/shell_rig.h"
+#include "tests/shell/window_rig.h"
 
-#include <QAction>
 #include <QApplication>
-#include <QLabel>
 #include <QMenuBar>
 #include <QMessageBox>
 #include <QPlainTextEdit>
 #include <QProgressBar>
-#include <QPushButton>
-#include <QTest>
 
 namespace {
 
-// The real window on a real event loop; only socket, clock and folder are the test's.
-struct MainWindow : testing::Test {
+// The window and a display of one red bulb.
+struct MainWindow : WindowRig {
     void SetUp() override {
-        rig.start();
-        rig.startUp(window);
-        const auto display = std::make_unique<ZephSimulation>();
+        WindowRig::SetUp();
         ShellRig::buildDisplay(*display);
         file = rig.save(*display, "bulb.zee");
     }
-    template <typename Widget>
-    Widget* find(const char* name) {
-        Widget* widget = window.findChild<Widget*>(name);
-        EXPECT_NE(widget, nullptr) << name;
-        return widget;
-    }
-    QString panel(int number) { return find<QLabel>(qPrintable(QString("StatusBar1Panel%1").arg(number)))->text(); }
-    QColor canvasAt(int x, int y) { return find<QWidget>("picMain")->grab().toImage().pixelColor(x, y); }
+    void openBulb() { open(*display, "bulb.zee"); }
     void enter() {
-        window.show();
-        ASSERT_TRUE(QTest::qWaitForWindowActive(&window));
-        ASSERT_TRUE(window.openFile(QString::fromStdString(file), false));
+        openBulb();
         find<QAction>("mnuSimulationMode")->trigger();
         ASSERT_TRUE(rig.program.simulating());
     }
@@ -46,10 +30,7 @@ struct MainWindow : testing::Test {
         }
     }
 
-    WindowHost host;
-    ShellRig rig{host};
-    frmZephMain window{rig.program, host};
-    std::string file;
+    std::unique_ptr<ZephSimulation> display = std::make_unique<ZephSimulation>();
 };
 
 }  // namespace
@@ -76,7 +57,7 @@ TEST_F(MainWindow, AQuietFileThatFailsClearsBothNames) {
 }
 
 TEST_F(MainWindow, SimulatesAndComesBackByEsc) {
-    const QSize before = window.size();
+    const QSize before(1024, 700);
     enter();
     EXPECT_EQ(panel(2), "UDP Simulation active on 127.0.0.1 (30303)");
     EXPECT_FALSE(window.menuBar()->isVisible());
@@ -90,7 +71,7 @@ TEST_F(MainWindow, SimulatesAndComesBackByEsc) {
     EXPECT_EQ(canvasAt(20, 10), QColor(255, 0, 0));
     EXPECT_TRUE(panel(3).startsWith("FPS:")) << panel(3).toStdString();
 
-    QTest::keyClick(&window, Qt::Key_Escape);
+    key(Qt::Key_Escape);
     run(2);
     EXPECT_FALSE(rig.program.simulating());
     EXPECT_TRUE(window.menuBar()->isVisible());
@@ -110,9 +91,9 @@ TEST_F(MainWindow, TheGaugeShowsWhatWaits) {
     EXPECT_TRUE(find<QProgressBar>("prbQueueLen")->styleSheet().contains("#ffff00"));
 }
 
-TEST_F(MainWindow, TheStopButtonAndTheCloseButtonEndASimulationOnly) {
+TEST_F(MainWindow, StoppingAndClosingEndASimulationOnlyUnlessTheSettingSaysMore) {
     enter();
-    QTest::mouseClick(find<QPushButton>("cmdStop"), Qt::LeftButton);
+    click<QPushButton>("cmdStop");
     run(2);
     EXPECT_FALSE(rig.program.simulating());
 
@@ -122,22 +103,18 @@ TEST_F(MainWindow, TheStopButtonAndTheCloseButtonEndASimulationOnly) {
     run(2);
     EXPECT_FALSE(rig.program.simulating());
     EXPECT_TRUE(window.isVisible());
-    EXPECT_TRUE(window.close());
-    EXPECT_EQ(rig.socket.State(), 0);
-}
 
-TEST_F(MainWindow, ClosesOutOfASimulationWhereTheSettingSaysSo) {
     rig.program.settings.EndStopsSimulation = false;
-    enter();
+    find<QAction>("mnuSimulationMode")->trigger();
     window.close();
     run(2);
     EXPECT_FALSE(rig.program.simulating());
     EXPECT_FALSE(window.isVisible());
+    EXPECT_EQ(rig.socket.State(), 0);
 }
 
 TEST_F(MainWindow, TellsOfADisplayWithoutChannels) {
-    window.show();
-    ASSERT_TRUE(window.openFile(QString::fromStdString(file), false));
+    openBulb();
     rig.program.simulation->Fixtures[1].ChannelCount = 0;
     QString told;
     QTimer::singleShot(50, &window, [&] {
