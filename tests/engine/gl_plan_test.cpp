@@ -8,19 +8,14 @@ const GLPlanUnit& unitOf(const GLPlan& plan, std::int32_t fixture, std::int32_t 
     return plan.Units[static_cast<std::size_t>(plan.UnitOfChannel[channelSlot(fixture, channel)])];
 }
 
-std::uint32_t slotOf(const GLPlan& plan, std::int32_t index) {
-    return plan.Vertices[plan.Indices[static_cast<std::size_t>(index)]].Slot;
-}
-
 const GLPlanUnit& unitOfGroup(const GLPlan& plan, std::size_t group) {
     return plan.Units[static_cast<std::size_t>(plan.UnitOfGroup[group])];
 }
 
 struct PlanStage : Stage {
-    ZephFixture& addBulbs(std::int32_t level, std::int32_t count, std::int32_t specialType = kSpecialNone) {
+    ZephFixture& addBulbs(std::int32_t level, std::int32_t count) {
         ZephFixture& fixture = addLit(kFixtureBulbs, 2, 3, {});
         fixture.ZOrder = level;
-        fixture.Channels[1].Sub_Type = specialType;
         for (std::int32_t b = 0; b < count; ++b)
             addPoint(fixture, kPointBulb, {10 + 10 * b, 20});
         return fixture;
@@ -50,26 +45,6 @@ TEST(GLPlan, LaysTrianglesOutInTheOrderOfPainting) {
     EXPECT_EQ(plan.SlotColors, (std::vector<std::uint32_t>{0x070809, 0, kWhite}));
     const GLVertex& corner = plan.Vertices[plan.Indices[0]];
     EXPECT_TRUE((corner.X == 8 || corner.X == 12) && (corner.Y == 18 || corner.Y == 22)) << corner.X << "," << corner.Y;
-}
-
-TEST(GLPlan, GivesColoursAndFlashingBulbsSlotsOfTheirOwn) {
-    PlanStage stage;
-    ZephChannel& multi = stage.addBulbs(1, 5, kSpecialMultiColor).Channels[1];
-    multi.Sub_Parm = 2;
-    multi.Multi[2] = packColor(2, 0, 0);
-    stage.addBulbs(1, 3, kSpecialStrobes);
-    stage.addBulbs(1, 3, 3);  // no special type that is drawn
-    const GLPlan plan = stage.plan();
-
-    const GLPlanUnit& colours = unitOf(plan, 1, 1);
-    EXPECT_EQ(colours.SlotCount, 2);
-    for (std::int32_t b = 0; b < 5; ++b)
-        EXPECT_EQ(slotOf(plan, colours.FirstIndex + 6 * b), static_cast<std::uint32_t>(b % 2)) << b;
-    EXPECT_EQ(plan.SlotColors[1], 2U);
-    const GLPlanUnit& strobes = unitOf(plan, 2, 1);
-    EXPECT_EQ(strobes.SlotCount, 3);
-    EXPECT_EQ(slotOf(plan, strobes.FirstIndex + 12), 4U);
-    EXPECT_LT(unitOf(plan, 3, 1).Shape, 0);
 }
 
 TEST(GLPlan, LeavesBulbsOutThatAreNotDrawn) {

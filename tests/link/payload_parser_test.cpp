@@ -225,17 +225,3 @@ TEST_F(Parser, AFaultOfTheSinkCostsTheFrameOnly) {
     EXPECT_EQ(circuitsOf(""), (List{6}));
     EXPECT_TRUE(failures.reports.empty());
 }
-
-TEST_F(Parser, AHugeBufferIsWorkedOffWithoutLosingAFrame) {
-    std::string piece;
-    for (std::size_t i = 1; i <= 999; ++i)
-        piece += frame(1, circuit(i));
-    for (std::size_t round = 0; round < 20; ++round) {
-        const std::size_t cut = round * 731 + 1;
-        const std::size_t first = circuitsOf(piece.substr(0, cut)).size();
-        const List rest = circuitsOf(piece.substr(cut));
-        ASSERT_EQ(first + rest.size(), 999u) << round;
-        EXPECT_EQ(rest.back(), 999);
-    }
-    EXPECT_EQ(kept(), "");
-}

@@ -55,10 +55,3 @@ TEST(ToolOptions, NameWhatIsWrongWithACall) {
     for (const auto& [call, problem] : rows)
         EXPECT_EQ(parseToolOptions(words(call)).problem, problem) << call;
 }
-
-TEST(ToolOptions, UsageAndHelpNameEveryCommand) {
-    for (const char* command : {"info", "table", "trace", "render", "send", "record", "demo-show", "convert"}) {
-        EXPECT_NE(toolHelp("").find(std::string("zeph-tool ") + command), std::string::npos) << command;
-        EXPECT_EQ(toolUsage(command).rfind(std::string("usage: zeph-tool ") + command, 0), 0u) << command;
-    }
-}

@@ -165,6 +165,11 @@ TEST_F(OptionsDialog, CancelAndResetGiveNoDraft) {
     EXPECT_FALSE(dialog->isVisible());
     EXPECT_TRUE(dialog->wasReset());
     EXPECT_EQ(resets, 1);
+    const std::string asked = "Qen Visualizer-Reset Options to Defaults?|Are you sure you want to reset all options to "
+                              "defaults?\r\nNote: This operation will reset your entire environment\r\nincluding "
+                              "editor colors, recent files, toolbar locations, etc\n";
+    EXPECT_EQ(host.boxTexts(),
+              asked + asked + "Qen Visualizer-Reset Options to Defaults|All options reset to defaults");
 }
 
 namespace {

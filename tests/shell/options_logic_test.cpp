@@ -93,21 +93,3 @@ TEST(OptionsLogic, AnotherLinkIsToldOnlyOnceTheLinkIsOpen) {
         }
     }
 }
-
-TEST(OptionsLogic, AResetIsAskedForAndTold) {
-    RecordingHost host;
-    int resets = 0;
-    host.answers = {BoxAnswer::Cancel, BoxAnswer::Ok};
-    EXPECT_FALSE(ZephResetOptions(host, [&] { ++resets; }));
-    EXPECT_EQ(resets, 0);
-    EXPECT_EQ(host.boxTexts(),
-              "Qen Visualizer-Reset Options to Defaults?|Are you sure you want to reset all options to "
-              "defaults?\r\nNote: This operation will reset your entire environment\r\n"
-              "including editor colors, recent files, toolbar locations, etc");
-    EXPECT_EQ(host.boxes[0].buttons, BoxButtons::OkCancel);
-    host.boxes.clear();
-    EXPECT_TRUE(ZephResetOptions(host, [&] { ++resets; }));
-    EXPECT_EQ(resets, 1);
-    EXPECT_THAT(host.boxTexts(), testing::EndsWith("\nQen Visualizer-Reset Options to Defaults|All options reset to "
-                                                   "defaults"));
-}
