@@ -9,6 +9,22 @@
 #include <QPushButton>
 #include <QTest>
 
+// The window's host; keeps what was told, and answers boxes itself unless they are to be seen.
+class NotingHost : public WindowHost {
+public:
+    BoxAnswer messageBox(std::string_view title, std::string_view text, BoxIcon icon, BoxButtons buttons) override {
+        return seen ? WindowHost::messageBox(title, text, icon, buttons) : notes.messageBox(title, text, icon, buttons);
+    }
+    void setStatusPanel(int panel, std::string_view text) override {
+        notes.setStatusPanel(panel, text);
+        WindowHost::setStatusPanel(panel, text);
+    }
+    void showCompileErrors(std::string_view text) override { notes.showCompileErrors(text); }
+
+    RecordingHost notes;
+    bool seen = false;
+};
+
 struct WindowRig : testing::Test {
     void SetUp() override {
         rig.start();
@@ -39,7 +55,7 @@ struct WindowRig : testing::Test {
     QString panel(int number) { return find<QLabel>(qPrintable(QString("StatusBar1Panel%1").arg(number)))->text(); }
     QColor canvasAt(int x, int y) { return find<QWidget>("picMain")->grab().toImage().pixelColor(x, y); }
 
-    WindowHost host;
+    NotingHost host;
     ShellRig rig{host};
     frmZephMain window{rig.program, host};
     std::string file;
