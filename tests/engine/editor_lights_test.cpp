@@ -89,6 +89,12 @@ TEST(EditorLights, PointsAreCutAtTheEdgesAndPlaceHoldersAreNotShown) {
     };
     EXPECT_EQ(point(3), ".......bb...........");
     EXPECT_EQ(point(6), "b......bb..........b");  // there is no such point
+
+    Desk high(kFixtureBulbs, {{8, -1}, {8, 0}, {8, 6}, {8, 7}});
+    high.light(kRed);
+    high.drawn();
+    for (const auto& [y, red] : {std::pair{0, true}, {1, false}, {4, false}, {5, true}})
+        EXPECT_EQ(high.canvas.pixel(8, y), red ? 0xFFFF0000U : 0xFFFFFFFFU) << y;
 }
 
 TEST(EditorLights, LevelsClosedToEditingAreDimmedOrHidden) {

@@ -115,8 +115,9 @@ TEST(Frames, AllocateNothing) {
     for (int frame = 0; frame < 400; ++frame) {
         const std::int32_t nowMs = EngineRig::kStart + 9 * frame;
         AllocationCount count;
-        // Everything at once, then a few at a time, and at the end hardly any.
-        if (frame % 20 == 0) yard.fileCommands(frame == 0 ? 1 : frame < 200 ? 3 : 100, nowMs);
+        // Hardly any before the first frame, so that no room is made by it; then everything, a few, and hardly any.
+        constexpr std::array kOneIn{100, 1, 3, 3, 1, 3, 100, 1, 100, 100};
+        if (frame % 40 == 0) yard.fileCommands(kOneIn[static_cast<std::size_t>(frame / 40)], nowMs);
         yard.clocks.ShimmerClock += 9;
         ZephRenderLights(nowMs, run);
         if (frame > 0) {

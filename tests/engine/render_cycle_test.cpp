@@ -24,6 +24,8 @@ TEST(Commands, FadeInProportionAndNeverShowARisingZeroTwice) {
     EXPECT_EQ(rig.shown({0, 500, 1000, 5000}), "1=0, 1=50, 1=100, 1=100");
     rig.command(1, 1, 0, 1, 1000, 0, 5000);
     EXPECT_EQ(rig.shown({5100, 5200}), "1=0, 1=1");
+    rig.command(1, 1, 40, 100, 1000, 0, 5500);
+    EXPECT_EQ(rig.shown({5209}), "1=40") << "a clock that ran backwards fades nothing";
 }
 
 TEST(Commands, ToZeroAreCarriedOutOnceThenEnd) {
@@ -157,9 +159,11 @@ TEST(Strobes, BeginAtRandomPhasesAndAlternate) {
     rig.random.values = {0.5};  // the next flash one whole interval from now
     EXPECT_THAT(lit(62), ElementsAre(0, 1));
     EXPECT_THAT(lit(111), ElementsAre(0, 1));
+    EXPECT_THAT(lit(162), ElementsAre(0, 0)) << "counted from the moment off, not from the end of the flash";
+    EXPECT_THAT(lit(163), ElementsAre(1, 0));
     EXPECT_EQ(rig.surface.plain.at(0).Alpha, 255);
-    rig.command(1, 1, 0, 0, 0, 0, 111);
-    rig.shown({120, 129});
+    rig.command(1, 1, 0, 0, 0, 0, 163);
+    rig.shown({172, 181});
     EXPECT_FALSE((*rig.states)[1].Channels[1].StrobeRunning) << "a fresh strobe begins anew";
 }
 

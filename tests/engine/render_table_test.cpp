@@ -195,7 +195,7 @@ TEST(KeySearch, BothFormsFindWhatABisectionFinds) {
         std::vector<std::int32_t> found(probes.size());
         search.findMany(probes, found.data());
         for (std::size_t i = 0; i < probes.size(); ++i) {
-            const auto [first, last] = std::ranges::equal_range(sorted, probes[i]);
+            const auto [first, last] = std::equal_range(sorted.begin(), sorted.end(), probes[i]);
             const auto expected = first == last ? 0 : static_cast<std::int32_t>(first - sorted.begin()) + 1;
             ASSERT_EQ(found[i], expected) << count << " keys, probe " << probes[i];
             ASSERT_EQ(search.findPortable(probes[i]), expected) << count << " keys, probe " << probes[i];

@@ -245,12 +245,15 @@ TEST(ColourEffects, EffectsWithTheSameMaskDifferInTheColourThatAddressesThem) {
     EXPECT_EQ(KeshTwinkleOrDazzle(10), -1);
     EXPECT_EQ(KeshTwinkleOrDazzle(22), -1);
     EXPECT_EQ(KeshTwinkleOrDazzle(23), 2);
-    RibbonRig rig(1, 1);  // Sequential at "25 Pixels": channel 1 is red of pixel 1, channel 26 green
-    rig.ribbon().KeshIntensity = 100;
-    rig.send(155, 25);
-    rig.pass(9);
-    EXPECT_EQ(rig.surface.groups.size(), 25u);
-    EXPECT_EQ(rig.group().EffectMask, 131);
+    // Sequential, and half as fine as it is wired: the first 25 reds or the 25 behind them.
+    for (const int effect : {21, 25}) {
+        RibbonRig rig(1, 0);
+        rig.ribbon().KeshResolution = 1;
+        rig.send(155, effect);
+        rig.pass(9);
+        EXPECT_EQ(rig.group(effect == 25 ? 25 : 26).EffectMask, 131);
+        EXPECT_EQ(rig.group(effect == 25 ? 26 : 25).EffectMask, 0);
+    }
 }
 
 TEST(RgbEffects, TheGlitterLoopLeavesWhenNoColourCanComeOn) {
