@@ -152,16 +152,6 @@ TEST(OpenGLSurface, DrawsFloodsAsDiscsUpToTheirOpacity) {
     EXPECT_EQ(at(255, 70, 70), qRgb(0, 0, 0));
 }
 
-TEST(OpenGLSurface, FillsTheArmsOfStarsAlone) {
-    const DarkStage stage(60, 60, 16, 7, {{30, 30}});
-    const QImage drawn = GLRig(stage).frame({lit(128)}, stage.tables);
-    // A four-pointed star: light along its arms, none between them, none twice.
-    for (const QPoint& arm : {QPoint(29, 20), QPoint(40, 29), QPoint(29, 40), QPoint(20, 29), QPoint(29, 29)})
-        EXPECT_NEAR(qRed(drawn.pixel(arm)), 128, 1) << arm.x() << "," << arm.y();
-    for (const QPoint& gap : {QPoint(20, 20), QPoint(40, 20), QPoint(40, 40), QPoint(20, 40)})
-        EXPECT_EQ(qRed(drawn.pixel(gap)), 0) << gap.x() << "," << gap.y();
-}
-
 TEST(OpenGLSurface, LaysThePictureOverBlack) {
     struct Row {
         bool picture;

@@ -69,7 +69,7 @@ TEST(FrameWriter, RefusesAFrameOverTheLimitsOnlyWhenItIsTaken) {
 
     FrameWriter dumps;
     const std::uint8_t levels[999] = {};
-    for (const std::size_t last : {962, 963}) {  // 4 x 2013 + 1939 + 7 = 9998
+    for (const std::size_t last : {962U, 963U}) {  // 4 x 2013 + 1939 + 7 = 9998
         for (int i = 0; i < 4; ++i)
             dumps.dmxDump(1, levels);
         dumps.dmxDump(1, std::span(levels).first(last));
