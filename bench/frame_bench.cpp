@@ -1,9 +1,11 @@
 // One whole frame on the standard surface, background restored, beside what a user could take instead: QPainter and
 // pixman drawing the same images at the same opacities, and a plain loop over pixels. Levels change in every frame.
+#include "bench/bench_display.h"
 #include "bench/bench_report.h"
 #include "engine/standard_surface.h"
-#include "tests/support/hand_tables.h"
+#include "tests/support/fixtures.h"
 #include "tests/support/limit_document.h"
+#include "tests/support/masks.h"
 #include "util/color.h"
 #include "util/random_source.h"
 
@@ -59,12 +61,8 @@ QImage asPicture(const BulbImage& image) {
 }
 
 // A document of plain channels made ready to draw, for the surface and for its peers alike.
-struct Scene {
-    std::unique_ptr<ZephSimulation> document = std::make_unique<ZephSimulation>();
-    std::unique_ptr<ZephFixtureStates> states = std::make_unique<ZephFixtureStates>();
+struct Scene : BenchDisplay {
     std::unique_ptr<ZephStaticBulbs> bulbs = std::make_unique<ZephStaticBulbs>();
-    std::unique_ptr<ZephMasks> masks = std::make_unique<ZephMasks>();
-    ZephRenderTables tables;
     QImage background = gradient();
 
     struct Channel {
@@ -76,15 +74,10 @@ struct Scene {
     std::vector<Channel> channels;
 
     void finish() {
-        ZephDimmingCurve curve;
-        for (std::size_t i = 0; i < curve.size(); ++i)
-            curve[i] = static_cast<std::uint8_t>(i);
-        ZephSetUpMasks(
-            curve, [](std::string_view) {}, *masks);
-        buildHandTables(*document, tables, *states);
-        ZephRebuildStaticFixtureBulbs(*document, *masks, *bulbs);
-        for (std::int32_t n = 1; n <= document->FixtureCount; ++n) {
-            const ZephFixture& fixture = document->Fixtures[n];
+        compile();
+        ZephRebuildStaticFixtureBulbs(*simulation, masks(), *bulbs);
+        for (std::int32_t n = 1; n <= simulation->FixtureCount; ++n) {
+            const ZephFixture& fixture = simulation->Fixtures[n];
             if (fixture.Channel_Type == kChannelRgb) continue;
             for (std::int32_t c = 1; c <= fixture.ChannelCount; ++c) {
                 const auto slot = static_cast<std::size_t>(c);
@@ -106,7 +99,7 @@ struct Scene {
         }
     }
 
-    SurfaceScene surfaceScene() const { return {*document, tables, *states, *masks, *bulbs, background}; }
+    SurfaceScene surfaceScene() const { return {*simulation, tables, *states, masks(), *bulbs, background}; }
 };
 
 double surfaceFrame(Scene& scene, std::uint32_t step) {
@@ -252,7 +245,7 @@ void benchThin(const std::string& layout, Scene& scene, double& tenth, double& h
 
 void benchLimit(BenchReport& report) {
     Scene scene;
-    buildLimitDocument(*scene.document);
+    buildLimitDocument(*scene.simulation);
     scene.finish();
     double tenth = 0;
     double hundredth = 0;
@@ -273,7 +266,7 @@ void benchLimit(BenchReport& report) {
 
 void benchBigBulbs(BenchReport& report) {
     Scene scene;
-    buildLimitDocument(*scene.document, {.bulbSize = 8});
+    buildLimitDocument(*scene.simulation, {.bulbSize = 8});
     scene.finish();
     scatter(scene);
     const PeerTimes all = besidePeers("Frame of 262,144 round bulbs of size 8 scattered, all lit", scene, report);
@@ -283,18 +276,10 @@ void benchBigBulbs(BenchReport& report) {
 
 void benchFloods(BenchReport& report) {
     Scene scene;
-    scene.document->FixtureCount = 64;
-    for (std::int32_t n = 1; n <= 64; ++n) {
-        ZephFixture& fixture = scene.document->Fixtures[n];
-        fixture.Fixture_Type = kFixtureFlood;
-        fixture.Channel_Type = kChannelNormal;
-        fixture.BulbSize = 64;
-        fixture.ZOrder = 1;
-        fixture.ChannelCount = 1;
-        fixture.Channels[1].Color = packColor(255, 4 * n - 1, 90);
-        fixture.PointCount = 1;
-        fixture.DrawPoints[1] = {kPointBulb, (150 + (n - 1) % 8 * 300) * TwipsPerPixelX,
-                                 (150 + (n - 1) / 8 * 300) * TwipsPerPixelY};
+    for (std::int32_t n = 0; n < 64; ++n) {
+        ZephFixture& flood = addFixture(*scene.simulation, kFixtureFlood, {{150 + n % 8 * 300, 150 + n / 8 * 300}});
+        flood.BulbSize = 64;
+        addChannel(flood, 1 + n, 1, packColor(255, 4 * n + 3, 90));
     }
     scene.finish();
     const PeerTimes all = besidePeers("Frame of 64 floods of size 64", scene, report);
@@ -304,9 +289,12 @@ void benchFloods(BenchReport& report) {
 
 void benchRibbons(BenchReport& report) {
     Scene scene;
-    buildLimitDocument(*scene.document, {.points = 50, .channels = 0, .fixtureType = kFixtureKesh});
-    for (std::int32_t n = 1; n <= scene.document->FixtureCount; ++n) {
-        scene.document->Fixtures[n].Channel_Type = kChannelRgb;
+    buildLimitDocument(*scene.simulation, {.points = 50, .channels = 0, .fixtureType = kFixtureKesh});
+    for (std::int32_t n = 1; n <= scene.simulation->FixtureCount; ++n) {
+        ZephFixture& ribbon = scene.simulation->Fixtures[n];
+        ribbon.Channel_Type = kChannelRgb;
+        ribbon.Kesh.Network = (n - 1) / 240;
+        ribbon.Kesh.Base_Unit = (n - 1) % 240 + 1;
     }
     scene.finish();
     StopOnFailure failures;
@@ -353,16 +341,11 @@ void benchFrame(BenchReport& report) {
 }
 
 void benchMasks(BenchReport& report) {
-    ZephDimmingCurve curve;
-    for (std::size_t i = 0; i < curve.size(); ++i)
-        curve[i] = static_cast<std::uint8_t>(i);
-    const auto masks = std::make_unique<ZephMasks>();
+    const ZephDimmingCurve curve = ZephCreateDummyDimmingCurve();
+    const auto made = std::make_unique<ZephMasks>();
+    const auto quietly = [](std::string_view) {};
     const double time = medianMicroseconds(
-        11, [&] { *masks = {}; },
-        [&] {
-            ZephSetUpMasks(
-                curve, [](std::string_view) {}, *masks);
-        });
+        11, [&] { *made = {}; }, [&] { ZephSetUpMasks(curve, quietly, *made); });
     report.row("All masks, shapes and floods", "at start-up", time);
     report.goal("masks", shown("%.1f ms", time / 1000), "60 ms", time <= 60000);
 }

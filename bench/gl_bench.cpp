@@ -1,11 +1,11 @@
 // The OpenGL surface at the limit document: the processor's part of a frame, without what the driver does after, beside
 // sending every corner anew; and whole frames on this machine's driver, beside a call for each bulb.
+#include "bench/bench_display.h"
 #include "bench/bench_report.h"
 #include "engine/gl_offscreen.h"
 #include "engine/gl_programs.h"
 #include "engine/opengl_surface.h"
 #include "model/dimming_curve.h"
-#include "tests/support/hand_tables.h"
 #include "tests/support/limit_document.h"
 
 #include <cstdio>
@@ -23,20 +23,17 @@ struct PrintedFailures : FailureReport {
     }
 };
 
-struct Scene {
-    std::unique_ptr<ZephSimulation> document = std::make_unique<ZephSimulation>();
-    std::unique_ptr<ZephFixtureStates> states = std::make_unique<ZephFixtureStates>();
+struct Scene : BenchDisplay {
     std::unique_ptr<ZephGLShapes> shapes = std::make_unique<ZephGLShapes>();
     ZephDimmingCurve curve = ZephCreateDummyDimmingCurve();
-    ZephRenderTables tables;
     std::vector<ChannelDraw> draws;  // in the order of painting
 
     Scene() {
-        buildLimitDocument(*document);
-        buildHandTables(*document, tables, *states);
+        buildLimitDocument(*simulation);
+        compile();
         ZephGLCreateShapes(*shapes);
-        for (std::int32_t n = 1; n <= document->FixtureCount; ++n) {
-            const ZephFixture& fixture = document->Fixtures[n];
+        for (std::int32_t n = 1; n <= simulation->FixtureCount; ++n) {
+            const ZephFixture& fixture = simulation->Fixtures[n];
             for (std::int32_t c = 1; c <= fixture.ChannelCount; ++c)
                 draws.push_back({fixture.ZOrder, n, c});
         }
@@ -62,7 +59,7 @@ struct Scene {
         for (const ChannelDraw& draw : draws) {
             const ZephBulbLocations& bulbs = *bulbLocations((*states)[draw.Fixture], draw.Channel);
             const auto color =
-                static_cast<std::uint32_t>(document->Fixtures[draw.Fixture].Channels[draw.Channel].Color) |
+                static_cast<std::uint32_t>(simulation->Fixtures[draw.Fixture].Channels[draw.Channel].Color) |
                 std::uint32_t{draw.Alpha} << 24;
             for (std::int32_t b = 0; b < bulbs.Count; ++b)
                 visit(tables.BulbPool[static_cast<std::size_t>(bulbs.First + b)], color);
@@ -102,7 +99,7 @@ double everyCornerAnew(Scene& scene, GLOffscreen& target) {
         std::uint32_t Color;
     };
     const GLApi api = loadGLApi([&](const char* name) { return target.resolve(name); });
-    const GLFill& fill = *fillOf(*scene.shapes, 1, scene.document->Fixtures[1].BulbSize);
+    const GLFill& fill = *fillOf(*scene.shapes, 1, scene.simulation->Fixtures[1].BulbSize);
     std::vector<ColoredCorner> corners;
     GLuint buffer = 0;
     api.GenBuffers(1, &buffer);
@@ -131,7 +128,7 @@ double oneCallABulb(Scene& scene, GLOffscreen& target) {
     const auto setPlace = reinterpret_cast<PFNGLVERTEXATTRIB2FPROC>(target.resolve("glVertexAttrib2f"));
     const auto setColor = reinterpret_cast<PFNGLVERTEXATTRIB4NUBPROC>(target.resolve("glVertexAttrib4Nub"));
     const auto drawElements = reinterpret_cast<decltype(&glDrawElements)>(target.resolve("glDrawElements"));
-    const GLFill& fill = *fillOf(*scene.shapes, 1, scene.document->Fixtures[1].BulbSize);
+    const GLFill& fill = *fillOf(*scene.shapes, 1, scene.simulation->Fixtures[1].BulbSize);
     const GLuint program = makeProgram(api, kListSource);
     std::array<GLuint, 2> buffers{};
     GLuint array = 0;
@@ -186,7 +183,7 @@ void benchGL(BenchReport& report) {
     PrintedFailures failures;
     OpenGLSurface surface;
     const QImage picture;
-    if (!surface.ZephGLStartup({*scene.document, scene.tables, *scene.states, scene.curve, *scene.shapes, picture, 20,
+    if (!surface.ZephGLStartup({*scene.simulation, scene.tables, *scene.states, scene.curve, *scene.shapes, picture, 20,
                                 kMaxCanvasPixels, kMaxCanvasPixels},
                                *target, failures)) {
         goalOf("no context", false, report);

@@ -152,7 +152,7 @@ private:
     ObjectPanel* objects_ = nullptr;
     CanvasViewport* canvas_ = nullptr;
     StatusRow* StatusBar1_ = nullptr;
-    QTimer hrTimer1_;
+    QTimer hrTimer1_{this};
     QTimer tmrAdjustBrightness_;
     QTimer tmrAutoSave_{this};
     int lastIntensity_ = 500;  // of sldIntensity at the timer's last tick; the first tick always sees a move

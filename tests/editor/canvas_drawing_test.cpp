@@ -1,30 +1,18 @@
 #include "editor/canvas_drawing.h"
-
-#include <memory>
+#include "tests/support/fixtures.h"
+#include "tests/support/masks.h"
 
 // Two bulbs of one place: the level decides which covers which, then the number.
 TEST(CanvasDrawing, CoversByLevelThenByNumber) {
     const auto simulation = std::make_unique<ZephSimulation>();
-    const auto masks = std::make_unique<ZephMasks>();
     const auto bulbs = std::make_unique<ZephStaticBulbs>();
-    ZephDimmingCurve curve{};
-    curve.fill(255);
-    ZephSetUpMasks(
-        curve, [](std::string_view) {}, *masks);
-    simulation->FixtureCount = 2;
-    for (const int number : {1, 2}) {
-        ZephFixture& fixture = simulation->Fixtures[number];
-        fixture.Fixture_Type = kFixtureBulbs;
-        fixture.Channel_Type = kChannelNormal;
-        fixture.BulbSize = 3;
-        fixture.BulbShape = 3;
-        fixture.ChannelCount = 1;
-        fixture.Channels[1].Color = number == 1 ? 255 : 255 * 65536;
-        fixture.PointCount = 1;
-        fixture.DrawPoints[1] = {kPointBulb, 10 * 15, 10 * 15};
+    const ZephDimmingCurve curve = ZephCreateDummyDimmingCurve();
+    for (const std::int32_t color : {255, 255 * 65536}) {
+        ZephFixture& fixture = addFixture(*simulation, kFixtureBulbs, {{10, 10}});
         fixture.ZOrder = 4;
+        addChannel(fixture, 1, 1, color);
     }
-    ZephRebuildStaticFixtureBulbs(*simulation, *masks, *bulbs);
+    ZephRebuildStaticFixtureBulbs(*simulation, masks(), *bulbs);
     QImage background(20, 20, QImage::Format_RGB32);
     background.fill(Qt::gray);
     const QRgb gray = background.pixel(0, 0);

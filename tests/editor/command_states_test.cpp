@@ -4,6 +4,7 @@
 
 #include <cctype>
 #include <map>
+#include <tuple>
 
 namespace {
 
@@ -140,7 +141,7 @@ TEST(CheckEnable, AStrokeShutsEverythingAndItsEndOpensItAgain) {
     EXPECT_EQ(states, before);
 }
 
-TEST(CheckEnable, AButtonFollowsItsCommand) {
+TEST(CheckEnable, ButtonsAndBandFollowTheirCommands) {
     EditorRig rig;
     rig.select(kStateSelectFixture, 2);
     CommandStates states;
@@ -149,35 +150,27 @@ TEST(CheckEnable, AButtonFollowsItsCommand) {
     EXPECT_TRUE(states.editButtons[11]);   // backward
     EXPECT_FALSE(states.editButtons[4]);   // a gap
     EXPECT_TRUE(states.drawButtons[14]);
-}
-
-TEST(CheckEnable, TheBandHidesNamesOnlyWhereNamesHaveAPlace) {
-    EditorRig rig;
-    OptionsBandState band;
-    OptionsToolbandCheckEnable({*rig.simulation, rig.editor, {}, 0, false}, band);
-    EXPECT_FALSE(band.chkNames);
-    EXPECT_TRUE(band.sldIntensity);
-    OptionsToolbandCheckEnable(rig.inputs(), band);
-    EXPECT_TRUE(band.chkNames);
+    EXPECT_TRUE(states.band.chkNames);
+    CommandInputs nameless = rig.inputs();
+    nameless.NameLocation = 0;  // names that have no place cannot be hidden
+    CheckEnable(true, nameless, states);
+    EXPECT_FALSE(states.band.chkNames);
+    EXPECT_TRUE(states.band.sldIntensity);
 }
 
 TEST(CommandTable, HasEveryButtonInItsPlace) {
-    const struct {
-        int index;
-        const char* edit;
-        const char* draw;
-    } rows[] = {{0, "", ""},
-                {1, "mnuFileNew", "mnuSimulationMode"},
-                {4, "", ""},
-                {9, "mnuSendToBackground", ""},
-                {15, "", ""},
-                {18, "mnuPasteObject", "mnuInsertProp"},
-                {21, "mnuRedo", "mnuCreateNewItem"},
-                {26, "mnuLoadQenReference", ""},
-                {27, "", ""}};
-    for (const auto& row : rows) {
-        EXPECT_EQ(commandRow(editButtonCommand(row.index)).name, row.edit) << row.index;
-        EXPECT_EQ(commandRow(drawButtonCommand(row.index)).name, row.draw) << row.index;
+    const std::tuple<int, const char*, const char*> rows[] = {{0, "", ""},
+                                                              {1, "mnuFileNew", "mnuSimulationMode"},
+                                                              {4, "", ""},
+                                                              {9, "mnuSendToBackground", ""},
+                                                              {15, "", ""},
+                                                              {18, "mnuPasteObject", "mnuInsertProp"},
+                                                              {21, "mnuRedo", "mnuCreateNewItem"},
+                                                              {26, "mnuLoadQenReference", ""},
+                                                              {27, "", ""}};
+    for (const auto& [index, edit, draw] : rows) {
+        EXPECT_EQ(commandRow(editButtonCommand(index)).name, edit) << index;
+        EXPECT_EQ(commandRow(drawButtonCommand(index)).name, draw) << index;
     }
 }
 
@@ -226,26 +219,21 @@ TEST(ToolBarTexts, NameTheLevelAndTheTopOfTheStores) {
 }
 
 TEST(ToolBarTexts, TellTheStateInPanelTwo) {
-    const struct {
-        int state;
-        int fixture;
-        bool suppress;
-        const char* text;
-    } rows[] = {{kStateSimulation, 0, false, "Simulation Active"},
-                {kStateSelectProp, 0, false, "Select Prop"},
-                {kStateSelectProp, 1, false, "Prop Selected:Wreath"},
-                {kStateSelectProp, 2, true, "Prop Selected:Snowman (arm)"},
-                {kStateSelectFixture, 0, false, "Select Fixture"},
-                {kStateSelectFixture, 3, false, "Fixture Selected:Hat - Layer:1"},
-                {kStateSelectFixture, 3, true, "Select Fixture"},
-                {kStateDrawing, 0, false, "Drawing"}};
     EditorRig rig;
-    for (const auto& row : rows) {
-        rig.select(row.state, row.fixture);
-        EXPECT_EQ(ZephUpdateStatusBarForUIState(*rig.simulation, rig.editor, row.suppress), row.text);
-    }
+    const auto text = [&](int state, int fixture, bool suppress = false) {
+        rig.select(state, fixture);
+        return ZephUpdateStatusBarForUIState(*rig.simulation, rig.editor, suppress);
+    };
+    EXPECT_EQ(text(kStateSimulation, 0), "Simulation Active");
+    EXPECT_EQ(text(kStateSelectProp, 0), "Select Prop");
+    EXPECT_EQ(text(kStateSelectProp, 1), "Prop Selected:Wreath");
+    EXPECT_EQ(text(kStateSelectProp, 2, true), "Prop Selected:Snowman (arm)");
+    EXPECT_EQ(text(kStateSelectFixture, 0), "Select Fixture");
+    EXPECT_EQ(text(kStateSelectFixture, 3), "Fixture Selected:Hat - Layer:1");
+    EXPECT_EQ(text(kStateSelectFixture, 3, true), "Select Fixture");
+    EXPECT_EQ(text(kStateDrawing, 0), "Drawing");
     rig.simulation->SimulationOpen = false;
-    EXPECT_EQ(ZephUpdateStatusBarForUIState(*rig.simulation, rig.editor, false), "");
+    EXPECT_EQ(text(kStateDrawing, 0), "");
 }
 
 TEST(ToolBarTexts, TheBandShowsTheDocumentsBrightnessAndThatNamesAreHidden) {

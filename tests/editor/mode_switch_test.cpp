@@ -137,9 +137,7 @@ TEST_F(Modes, OnlyLightStringsAreNotArmedTwice) {
 TEST_F(Modes, AWizardIsRefusedWhereItsPropWouldNotFit) {
     rig.simulation->PropCount = kMaxProps;
     drawTool_Click(kToolTreeWizard, context());
-    ASSERT_EQ(host.boxes.size(), 1U);
-    EXPECT_EQ(host.boxes[0].title, "Qen Visualizer-Error");
-    EXPECT_EQ(host.boxes[0].text, "You have created the maximum number (512) of props.");
+    EXPECT_EQ(host.boxTexts(), "Qen Visualizer-Error|You have created the maximum number (512) of props.");
     EXPECT_EQ(rig.editor.ZephUIState, kStateSelectFixture);
     drawTool_Click(kToolKesh, context());
     EXPECT_EQ(rig.editor.ZephUIState, kStateDrawing);
@@ -149,7 +147,9 @@ TEST_F(Modes, AWizardIsRefusedWhereItsPropWouldNotFit) {
 }
 
 TEST_F(Modes, NothingActsWithoutADocumentOrInASimulation) {
-    const auto tryAll = [&] {
+    for (const int state : {kStateSimulation, kStateSelectFixture}) {
+        rig.editor.ZephUIState = state;
+        rig.simulation->SimulationOpen = state == kStateSimulation;
         const ZephEditorState before = rig.editor;
         mnuSelect_Click(context());
         mnuItemTool_Click(context());
@@ -157,12 +157,7 @@ TEST_F(Modes, NothingActsWithoutADocumentOrInASimulation) {
         chkCmdFixtureOrProp_MouseUp(kToggleProps, true, context());
         flgObjectSelect_Click(1, context());
         EXPECT_EQ(rig.editor, before);
-    };
-    rig.editor.ZephUIState = kStateSimulation;
-    tryAll();
-    rig.editor.ZephUIState = kStateSelectFixture;
-    rig.simulation->SimulationOpen = false;
-    tryAll();
+    }
 }
 
 TEST_F(Modes, TheListSelectsLockedObjectsAndEndsDrawing) {
@@ -179,18 +174,17 @@ TEST_F(Modes, TheListSelectsLockedObjectsAndEndsDrawing) {
 
 TEST_F(Modes, TheListShowsWhatTheStateSelects) {
     const auto texts = [&] {
-        std::vector<std::string> shown;
+        std::string shown;
         for (const ZephListEntry& row : ZephListIndex(*rig.simulation, rig.editor))
-            shown.push_back(row.Text + "|" + std::to_string(row.Object));
+            shown += row.Text + "=" + std::to_string(row.Object) + " ";
         return shown;
     };
-    using Texts = std::vector<std::string>;
-    EXPECT_EQ(texts(), (Texts{"arm|2", "Hat|3", "Wreath|1"}));
+    EXPECT_EQ(texts(), "arm=2 Hat=3 Wreath=1 ");
     rig.select(kStateSelectProp, 3);
-    EXPECT_EQ(texts(), (Texts{"Snowman|3", "Wreath|1"}));
+    EXPECT_EQ(texts(), "Snowman=3 Wreath=1 ");
     chkSimplePropMode_Click(false, context());
-    EXPECT_EQ(texts(), (Texts{"Snowman\n(arm)|2", "Snowman\n(Hat)|3", "Wreath|1"}));
+    EXPECT_EQ(texts(), "Snowman\n(arm)=2 Snowman\n(Hat)=3 Wreath=1 ");
     EXPECT_EQ(rig.editor.ZephSelection.Object, 0);
     rig.simulation->SimulationOpen = false;
-    EXPECT_EQ(texts(), Texts{});
+    EXPECT_EQ(texts(), "");
 }

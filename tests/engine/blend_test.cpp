@@ -1,10 +1,7 @@
 #include "engine/blend.h"
 #include "util/random_source.h"
 
-#include <gtest/gtest.h>
-
 #include <cmath>
-#include <vector>
 
 namespace {
 
@@ -89,34 +86,6 @@ TEST(BlendKernels, AllFormsGiveThePixelsOfTheReference) {
         ASSERT_EQ(blended(BlendForm::Portable), expected) << "size " << mask.Size << " soft " << soft;
         if (blendFormAvailable(BlendForm::Avx2)) {
             ASSERT_EQ(blended(BlendForm::Avx2), expected) << "size " << mask.Size << " soft " << soft;
-        }
-    }
-}
-
-TEST(BlendClipped, DrawsWhatLiesOnTheCanvasAndNothingElse) {
-    SeededRandom random(12);
-    const BulbMask mask = randomMask(5, false, random);
-    BulbImage image;
-    makeBulbImage(&mask, 0x3366CC, image);
-    // A canvas of 20 x 12 within a frame of other pixels, which must stay.
-    std::vector<std::uint32_t> pixels(40 * 30, 0xFF112233U);
-    const Canvas canvas{{pixels.data() + 9 * 40 + 10, 40}, 20, 12};
-    for (const std::int64_t x : {std::int64_t{-9}, std::int64_t{15}, std::int64_t{1} << 31, -(std::int64_t{1} << 31)}) {
-        blendClipped(spriteOf(image), 255, x, -3, canvas);
-    }
-    for (int y = 0; y < 30; ++y) {
-        for (int x = 0; x < 40; ++x) {
-            const int canvasX = x - 10;
-            const int canvasY = y - 9;
-            const bool inside = canvasX >= 0 && canvasX < 20 && canvasY >= 0 && canvasY < 12;
-            const auto covers = [&](int left) {
-                const int column = canvasX - left;
-                const int row = canvasY + 3;
-                return inside && column >= 0 && column < 10 && row < 10 &&
-                       mask.Coverage[static_cast<std::size_t>(row * 10 + column)] == 255;
-            };
-            const std::uint32_t expected = covers(-9) || covers(15) ? 0xFFCC6633U : 0xFF112233U;
-            ASSERT_EQ(pixels[static_cast<std::size_t>(y * 40 + x)], expected) << canvasX << " " << canvasY;
         }
     }
 }

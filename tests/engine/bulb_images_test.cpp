@@ -1,47 +1,36 @@
 #include "engine/bulb_images.h"
+#include "tests/support/fixtures.h"
+#include "tests/support/masks.h"
 #include "util/color.h"
-
-#include <gtest/gtest.h>
-
-#include <memory>
 
 namespace {
 
 struct Workshop {
-    std::unique_ptr<ZephMasks> masks = std::make_unique<ZephMasks>();
-    ZephFixture fixture;
+    std::unique_ptr<ZephSimulation> document = std::make_unique<ZephSimulation>();
+    ZephFixture& fixture = addFixture(*document, kFixtureStrings);
     ZephFixtureBulbs bulbs;
 
-    Workshop() {
-        ZephDimmingCurve curve;
-        for (std::size_t i = 0; i < curve.size(); ++i)
-            curve[i] = static_cast<std::uint8_t>(i);
-        ZephSetUpMasks(
-            curve, [](std::string_view) {}, *masks);
-        fixture.Fixture_Type = kFixtureStrings;
-        fixture.Channel_Type = kChannelNormal;
-        fixture.BulbSize = 3;
-        fixture.BulbShape = 4;
-    }
-    void create() { ZephCreateStaticFixtureBulbs(fixture, *masks, bulbs); }
+    void create() { ZephCreateStaticFixtureBulbs(fixture, masks(), bulbs); }
 };
 
 }  // namespace
 
 TEST(StaticBulbs, EachChannelHasItsColourAndAMultiColorOneASetOfThem) {
     Workshop shop;
-    shop.fixture.ChannelCount = 3;
-    shop.fixture.Channels[1].Color = packColor(1, 2, 3);
-    shop.fixture.Channels[2].Sub_Type = kSpecialMultiColor;
-    shop.fixture.Channels[2].Sub_Parm = 2;
-    shop.fixture.Channels[2].Multi[1] = packColor(255, 0, 0);
-    shop.fixture.Channels[2].Multi[2] = packColor(0, 255, 0);
-    shop.fixture.Channels[3].Sub_Type = kSpecialMultiColor;
-    shop.fixture.Channels[3].Sub_Parm = 99;  // of a damaged file: five
+    addChannel(shop.fixture, 1, 1, packColor(1, 2, 3));
+    ZephChannel& multi = addChannel(shop.fixture, 1, 2);
+    multi.Sub_Type = kSpecialMultiColor;
+    multi.Sub_Parm = 2;
+    multi.Multi[1] = packColor(255, 0, 0);
+    multi.Multi[2] = packColor(0, 255, 0);
+    ZephChannel& damaged = addChannel(shop.fixture, 1, 3);
+    damaged.Sub_Type = kSpecialMultiColor;
+    damaged.Sub_Parm = 99;  // counts as five
+    shop.fixture.BulbSize = 3;
+    shop.fixture.BulbShape = 4;
     shop.create();
-
     EXPECT_EQ(shop.bulbs.Bulb[1].Color, 0xFF010203U);
-    EXPECT_EQ(shop.bulbs.Bulb[1].Mask, &shop.masks->ZephBulbMasks[3][4]);
+    EXPECT_EQ(shop.bulbs.Bulb[1].Mask, &masks().ZephBulbMasks[3][4]);
     EXPECT_EQ(shop.bulbs.MultiColorBulbs.size(), 2U);
     EXPECT_EQ(channelImage(shop.fixture, 2, 1, shop.bulbs).Color, 0xFFFF0000U);
     EXPECT_EQ(channelImage(shop.fixture, 2, 4, shop.bulbs).Color, 0xFF00FF00U);
@@ -67,13 +56,12 @@ TEST(StaticBulbs, AFloodHasPixelsOfItsOwn) {
     Workshop shop;
     shop.fixture.Fixture_Type = kFixtureFlood;
     shop.fixture.BulbSize = 10;
-    shop.fixture.ChannelCount = 1;
-    shop.fixture.Channels[1].Color = packColor(200, 100, 10);
+    addChannel(shop.fixture, 1, 1, packColor(200, 100, 10));
     shop.create();
     // The outermost ring of four has the coverage 59: 200 x 59 / 255 = 46.3, 23.1, 2.3.
-    const BulbImage& image = shop.bulbs.Bulb[1];
-    EXPECT_EQ(image.Pixels[static_cast<std::size_t>(10 * image.Mask->Stride)], 0x3B2E1702U);
-    EXPECT_EQ(shop.bulbs.BlackBulb.Pixels[static_cast<std::size_t>(10 * image.Mask->Stride)], 0x3B000000U);
+    const auto rim = static_cast<std::size_t>(10 * shop.bulbs.Bulb[1].Mask->Stride);
+    EXPECT_EQ(shop.bulbs.Bulb[1].Pixels[rim], 0x3B2E1702U);
+    EXPECT_EQ(shop.bulbs.BlackBulb.Pixels[rim], 0x3B000000U);
     shop.fixture.BulbSize = 65;
     shop.create();
     EXPECT_EQ(shop.bulbs.Bulb[1].Mask, nullptr);
@@ -81,15 +69,13 @@ TEST(StaticBulbs, AFloodHasPixelsOfItsOwn) {
 
 TEST(StaticBulbs, ARebuildEmptiesTheSlotsThatFellFree) {
     Workshop shop;
-    auto document = std::make_unique<ZephSimulation>();
     auto bulbs = std::make_unique<ZephStaticBulbs>();
-    shop.fixture.ChannelCount = 1;
-    document->Fixtures[1] = document->Fixtures[2] = shop.fixture;
-    document->FixtureCount = 2;
-    ZephRebuildStaticFixtureBulbs(*document, *shop.masks, *bulbs);
+    addChannel(shop.fixture, 1, 1);
+    addChannel(addFixture(*shop.document, kFixtureStrings), 1, 2);
+    ZephRebuildStaticFixtureBulbs(*shop.document, masks(), *bulbs);
     EXPECT_NE((*bulbs)[2].Bulb[1].Mask, nullptr);
-    document->FixtureCount = 1;
-    ZephRebuildStaticFixtureBulbs(*document, *shop.masks, *bulbs);
+    shop.document->FixtureCount = 1;
+    ZephRebuildStaticFixtureBulbs(*shop.document, masks(), *bulbs);
     EXPECT_NE((*bulbs)[1].Bulb[1].Mask, nullptr);
     EXPECT_EQ((*bulbs)[2].Bulb[1].Mask, nullptr);
 }

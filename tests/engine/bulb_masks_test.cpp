@@ -1,40 +1,21 @@
 #include "engine/bulb_masks.h"
 #include "engine/bulb_shapes.h"
-
-#include <gtest/gtest.h>
-
-#include <memory>
-#include <string>
-#include <vector>
+#include "tests/support/masks.h"
 
 namespace {
 
-ZephDimmingCurve identityCurve() {
-    ZephDimmingCurve curve;
-    for (std::size_t i = 0; i < curve.size(); ++i)
-        curve[i] = static_cast<std::uint8_t>(i);
-    return curve;
-}
-
-std::unique_ptr<ZephMasks> makeMasks(const ZephDimmingCurve& curve = identityCurve()) {
-    auto masks = std::make_unique<ZephMasks>();
-    ZephSetUpMasks(
-        curve, [](std::string_view) {}, *masks);
-    return masks;
-}
-
-// '#' = covered, one line a row.
+// '#' = covered, a '/' between rows.
 std::string drawn(const BulbMask& mask) {
     std::string text;
     const auto side = static_cast<std::size_t>(2 * mask.Size);
     for (std::size_t i = 0; i < mask.Coverage.size(); ++i) {
+        if (i > 0 && i % side == 0) text += '/';
         text += mask.Coverage[i] == 0 ? '.' : '#';
-        if (i % side == side - 1) text += '\n';
     }
     return text;
 }
 
-std::uint8_t at(const BulbMask& mask, int x, int y) {
+int at(const BulbMask& mask, int x, int y) {
     return mask.Coverage[static_cast<std::size_t>(y * 2 * mask.Size + x)];
 }
 
@@ -50,28 +31,25 @@ TEST(BulbShapes, VerticesAreCutOffAtEverySize) {
 }
 
 TEST(BulbMasks, SmallBulbsAreDrawnHard) {
-    const auto masks = makeMasks();
-    EXPECT_EQ(drawn(masks->ZephBulbMasks[1][1]), "##\n##\n");
-    EXPECT_EQ(drawn(masks->ZephBulbMasks[2][1]), ".##.\n####\n####\n.##.\n");
-    EXPECT_EQ(drawn(masks->ZephBulbMasks[2][3]), "####\n####\n####\n####\n");
-    EXPECT_EQ(drawn(masks->ZephBulbMasks[3][1]), ".####.\n######\n######\n######\n######\n.####.\n");
+    const auto& bulbs = masks().ZephBulbMasks;
+    EXPECT_EQ(drawn(bulbs[1][1]), "##/##");
+    EXPECT_EQ(drawn(bulbs[2][1]), ".##./####/####/.##.");
+    EXPECT_EQ(drawn(bulbs[2][3]), "####/####/####/####");
+    EXPECT_EQ(drawn(bulbs[3][1]), ".####./######/######/######/######/.####.");
     // Corners at (3, 0), (8, 8) and (0, 8): the sides lie at 3 - 3y/8 and 3 + 5y/8, to the nearest pixel, and the base
     // is cut off.
-    EXPECT_EQ(drawn(masks->ZephBulbMasks[4][2]), "...#....\n...##...\n..###...\n..####..\n"
-                                                 "..#####.\n.######.\n.#######\n########\n");
+    EXPECT_EQ(drawn(bulbs[4][2]), "...#..../...##.../..###.../..####../..#####./.######./.#######/########");
 }
 
 TEST(BulbMasks, EveryShapeIsVisibleAtEverySizeAndRoundOnesAreSymmetric) {
-    const auto masks = makeMasks();
     for (std::int32_t size = 1; size <= kMaxBulbSize; ++size) {
         for (std::int32_t shape = 1; shape <= kBulbShapes; ++shape) {
-            const BulbMask& mask = masks->ZephBulbMasks[size][shape];
+            const BulbMask& mask = masks().ZephBulbMasks[size][shape];
             ASSERT_EQ(mask.Coverage.size(), static_cast<std::size_t>(4 * size * size));
             EXPECT_NE(drawn(mask).find('#'), std::string::npos) << size << " " << shape;
-            for (const std::uint8_t coverage : mask.Coverage)
-                EXPECT_TRUE(coverage == 0 || coverage == 255);
+            EXPECT_THAT(mask.Coverage, testing::Each(testing::AnyOf(0, 255)));
         }
-        const BulbMask& round = masks->ZephBulbMasks[size][1];
+        const BulbMask& round = masks().ZephBulbMasks[size][1];
         for (int y = 0; y < 2 * size; ++y) {
             for (int x = 0; x < 2 * size; ++x) {
                 EXPECT_EQ(at(round, x, y), at(round, 2 * size - 1 - x, y));
@@ -82,34 +60,22 @@ TEST(BulbMasks, EveryShapeIsVisibleAtEverySizeAndRoundOnesAreSymmetric) {
 }
 
 TEST(FloodMasks, AreStaircasesOfRingsUnderTheCurve) {
-    const auto masks = makeMasks();
-    const BulbMask& flood = masks->ZephFloodMasks[10];  // 4 rings (10 / 2.3 = 4.35), step 255 / 4.35 = 59
-    EXPECT_EQ(at(flood, 0, 10), 59);
-    EXPECT_EQ(at(flood, 1, 10), 59);
-    EXPECT_EQ(at(flood, 2, 10), 118);
-    EXPECT_EQ(at(flood, 4, 10), 177);
-    EXPECT_EQ(at(flood, 6, 10), 236);
-    EXPECT_EQ(at(flood, 9, 10), 236);
-    EXPECT_EQ(at(flood, 19, 10), 59);
+    const BulbMask& flood = masks().ZephFloodMasks[10];  // 4 rings (10 / 2.3 = 4.35), step 255 / 4.35 = 59
+    for (const auto& [x, expected] : {std::pair{0, 59}, {1, 59}, {2, 118}, {4, 177}, {6, 236}, {9, 236}, {19, 59}})
+        EXPECT_EQ(at(flood, x, 10), expected) << x;
     EXPECT_EQ(at(flood, 0, 0), 0);
+    EXPECT_EQ(drawn(masks().ZephFloodMasks[1]), "../..");
+    EXPECT_EQ(at(masks().ZephFloodMasks[2], 1, 1), 255);
+    EXPECT_EQ(at(masks().ZephFloodMasks[64], 63, 63), 252);  // 28 rings in steps of 9
 
     ZephDimmingCurve steep{};
     steep[236] = 200;
-    const BulbMask tight = makeMasks(steep)->ZephFloodMasks[10];
-    EXPECT_EQ(at(tight, 4, 10), 0);
-    EXPECT_EQ(at(tight, 6, 10), 200);
-}
-
-TEST(FloodMasks, SizeOneIsInvisibleAndSizeTwoIsNot) {
-    const auto masks = makeMasks();
-    EXPECT_EQ(drawn(masks->ZephFloodMasks[1]), "..\n..\n");
-    EXPECT_EQ(at(masks->ZephFloodMasks[2], 1, 1), 255);
-    EXPECT_EQ(masks->ZephFloodMasks[64].Coverage.size(), 128U * 128U);
-    EXPECT_EQ(at(masks->ZephFloodMasks[64], 63, 63), 252);  // 28 rings in steps of 9
+    const auto tight = makeMasks(steep);
+    EXPECT_EQ(at(tight->ZephFloodMasks[10], 4, 10), 0);
+    EXPECT_EQ(at(tight->ZephFloodMasks[10], 6, 10), 200);
 }
 
 TEST(MaskOf, LeavesOutWhatTheTablesDoNotHold) {
-    const auto masks = makeMasks();
     struct Case {
         std::int32_t type;
         std::int32_t size;
@@ -123,16 +89,16 @@ TEST(MaskOf, LeavesOutWhatTheTablesDoNotHold) {
         fixture.Fixture_Type = test.type;
         fixture.BulbSize = test.size;
         fixture.BulbShape = test.shape;
-        EXPECT_EQ(maskOf(*masks, fixture) != nullptr, test.found) << test.type << " " << test.size;
+        EXPECT_EQ(maskOf(masks(), fixture) != nullptr, test.found) << test.type << " " << test.size;
         EXPECT_EQ(maskOf(ZephMasks{}, fixture), nullptr);
     }
 }
 
 TEST(SetUpMasks, TellsWhatItIsDoing) {
     std::vector<std::string> texts;
-    auto masks = std::make_unique<ZephMasks>();
-    ZephSetUpMasks(
-        identityCurve(), [&](std::string_view text) { texts.emplace_back(text); }, *masks);
+    const auto made = std::make_unique<ZephMasks>();
+    const auto tell = [&](std::string_view text) { texts.emplace_back(text); };
+    ZephSetUpMasks(ZephCreateDummyDimmingCurve(), tell, *made);
     ASSERT_EQ(texts.size(), 11U + 64 + 64);
     EXPECT_EQ(texts[6], "Creating Bulb Masks - 4 Point Star");
     EXPECT_EQ(texts[11], "Creating Bulb Masks - Flood size:1");

@@ -1,31 +1,18 @@
 #include "engine/bulb_walk.h"
-
-#include <gtest/gtest.h>
-
-#include <memory>
-#include <string>
-#include <vector>
+#include "tests/support/fixtures.h"
 
 namespace {
 
-struct Point {
-    int type;
-    int x;  // pixels
-    int y;
-};
+using Points = std::vector<std::array<int, 3>>;  // type, x and y in pixels
 
 // Pitch 10: bulbs of radius 2 with 6 pixels between them.
-ZephFixture stringFixture(const std::vector<Point>& points, int channels) {
+ZephFixture stringFixture(const Points& points, int channels) {
     ZephFixture fixture;
-    fixture.Fixture_Type = kFixtureStrings;
-    fixture.Channel_Type = kChannelNormal;
+    InitializeFixture({}, fixture);
     fixture.BulbSpacing = 6;
-    fixture.BulbSize = 2;
-    fixture.BulbShape = 1;
     fixture.ChannelCount = channels;
-    for (const Point& point : points) {
-        fixture.DrawPoints[++fixture.PointCount] = {point.type, point.x * 15, point.y * 15};
-    }
+    for (const auto& [type, x, y] : points)
+        addPoint(fixture, type, {x, y});
     return fixture;
 }
 

@@ -1,11 +1,9 @@
 #include "engine/editor_lights.h"
+#include "tests/support/fixtures.h"
+#include "tests/support/masks.h"
 #include "util/color.h"
-#include "util/units.h"
 
-#include <gtest/gtest.h>
-
-#include <memory>
-#include <string>
+#include <map>
 
 namespace {
 
@@ -17,40 +15,26 @@ constexpr std::int32_t kBlue = packColor(0, 0, 255);
 struct Desk {
     std::unique_ptr<ZephSimulation> document = std::make_unique<ZephSimulation>();
     std::unique_ptr<ZephStaticBulbs> bulbs = std::make_unique<ZephStaticBulbs>();
-    std::unique_ptr<ZephMasks> masks = std::make_unique<ZephMasks>();
-    ZephDimmingCurve curve;
+    ZephDimmingCurve curve = ZephCreateDummyDimmingCurve();
     QImage canvas{20, 6, QImage::Format_RGB32};
     ZephFixture& fixture;
     bool inColor = true;
 
-    explicit Desk(std::int32_t type) : fixture(document->Fixtures[1]) {
-        for (std::size_t i = 0; i < curve.size(); ++i)
-            curve[i] = static_cast<std::uint8_t>(i);
-        ZephSetUpMasks(
-            curve, [](std::string_view) {}, *masks);
-        document->FixtureCount = 1;
-        fixture.Fixture_Type = type;
-        fixture.Channel_Type = kChannelNormal;
+    Desk(std::int32_t type, std::initializer_list<Place> places) : fixture(addFixture(*document, type, places)) {
         fixture.BulbSize = 1;
-        fixture.BulbShape = 1;
-        fixture.ZOrder = 1;
+        fixture.BulbSpacing = 0;
         fixture.Max_Opacity = 100;
     }
-    void addPoint(std::int32_t type, std::int32_t x, std::int32_t y) {
-        fixture.DrawPoints[++fixture.PointCount] = {type, x * TwipsPerPixelX, y * TwipsPerPixelY};
-    }
-    ZephChannel& addChannel(std::int32_t color) {
-        ZephChannel& channel = fixture.Channels[++fixture.ChannelCount];
-        channel.Color = color;
-        return channel;
-    }
+    ZephChannel& light(std::int32_t color) { return addChannel(fixture, 1, 1, color); }
     void prepare() {
         canvas.fill(0xFFFFFFFFU);
-        ZephRebuildStaticFixtureBulbs(*document, *masks, *bulbs);
+        ZephRebuildStaticFixtureBulbs(*document, masks(), *bulbs);
     }
     EditorLightsContext context() const { return {*document, *bulbs, curve, inColor}; }
 
     // Row 3 of the canvas: '.' white, r g b, k black, '?' anything else.
+    inline static const std::map<QRgb, char> kNamed{
+        {0xFFFFFFFFU, '.'}, {0xFFFF0000U, 'r'}, {0xFF00FF00U, 'g'}, {0xFF0000FFU, 'b'}, {0xFF000000U, 'k'}};
     std::string drawn() {
         prepare();
         ZephDrawEditorLights(context(), 1, canvas);
@@ -59,13 +43,8 @@ struct Desk {
     std::string row() const {
         std::string text;
         for (int x = 0; x < canvas.width(); ++x) {
-            const QRgb pixel = canvas.pixel(x, 3);
-            text += pixel == 0xFFFFFFFFU   ? '.'
-                    : pixel == 0xFFFF0000U ? 'r'
-                    : pixel == 0xFF00FF00U ? 'g'
-                    : pixel == 0xFF0000FFU ? 'b'
-                    : pixel == 0xFF000000U ? 'k'
-                                           : '?';
+            const auto known = kNamed.find(canvas.pixel(x, 3));
+            text += known == kNamed.end() ? '?' : known->second;
         }
         return text;
     }
@@ -74,12 +53,10 @@ struct Desk {
 }  // namespace
 
 TEST(EditorLights, StringsShowTheirChannelsInTurnOrASilhouetteOfTheFirst) {
-    Desk desk(kFixtureStrings);
+    Desk desk(kFixtureStrings, {{2, 3}, {18, 3}});
     desk.fixture.BulbSpacing = 2;  // a bulb every 4 pixels
-    desk.addPoint(kPointMove, 2, 3);
-    desk.addPoint(kPointLine, 18, 3);
-    desk.addChannel(kRed);
-    desk.addChannel(kGreen);
+    desk.light(kRed);
+    desk.light(kGreen);
     EXPECT_EQ(desk.drawn(), ".rr..gg..rr..gg.....");
     desk.inColor = false;
     EXPECT_EQ(desk.drawn(), ".kk......kk.........");
@@ -89,12 +66,9 @@ TEST(EditorLights, StringsShowTheirChannelsInTurnOrASilhouetteOfTheFirst) {
 }
 
 TEST(EditorLights, MultiColorStepsWithTheWalkAndBeginsAnewAtAStroke) {
-    Desk desk(kFixtureStrings);
-    desk.addPoint(kPointMove, 1, 3);
-    desk.addPoint(kPointLine, 11, 3);  // five bulbs
-    desk.addPoint(kPointMove, 14, 3);
-    desk.addPoint(kPointLine, 18, 3);
-    ZephChannel& channel = desk.addChannel(0);
+    Desk desk(kFixtureStrings, {{1, 3}, {11, 3}, {14, 3}, {18, 3}});
+    desk.fixture.DrawPoints[3].Type = kPointMove;
+    ZephChannel& channel = desk.light(0);
     channel.Sub_Type = kSpecialMultiColor;
     channel.Sub_Parm = 3;
     channel.Multi[1] = kRed;
@@ -104,28 +78,28 @@ TEST(EditorLights, MultiColorStepsWithTheWalkAndBeginsAnewAtAStroke) {
 }
 
 TEST(EditorLights, PointsAreCutAtTheEdgesAndPlaceHoldersAreNotShown) {
-    Desk desk(kFixtureDmxPixels);
-    desk.fixture.Channel_Type = kChannelRgb;
+    Desk desk(kFixtureDmxPixels, {{0, 3}, {5, 3}, {8, 3}, {20, 3}, {100'000'000, 3}});
+    desk.fixture.DrawPoints[2].Type = kPointPlaceHolder;
     desk.fixture.Sample = {0, 0, 0, 255};
-    desk.addPoint(kPointBulb, 0, 3);
-    desk.addPoint(kPointPlaceHolder, 5, 3);
-    desk.addPoint(kPointBulb, 8, 3);
-    desk.addPoint(kPointBulb, 20, 3);
-    desk.addPoint(kPointBulb, 100'000'000, 3);
     EXPECT_EQ(desk.drawn(), "b......bb..........b");
+    const auto point = [&](std::int32_t number) {
+        desk.prepare();
+        ZephDrawLights(desk.context(), {.Fixture = 1, .Intensity = 100, .PixelNumber = number}, desk.canvas);
+        return desk.row();
+    };
+    EXPECT_EQ(point(3), ".......bb...........");
+    EXPECT_EQ(point(6), "b......bb..........b");  // there is no such point
 
-    desk.prepare();
-    ZephDrawLights(desk.context(), {.Fixture = 1, .Intensity = 100, .PixelNumber = 3}, desk.canvas);
-    EXPECT_EQ(desk.row(), ".......bb...........");
-    desk.prepare();
-    ZephDrawLights(desk.context(), {.Fixture = 1, .Intensity = 100, .PixelNumber = 6}, desk.canvas);
-    EXPECT_EQ(desk.row(), "b......bb..........b");  // there is no such point
+    Desk high(kFixtureBulbs, {{8, -1}, {8, 0}, {8, 6}, {8, 7}});
+    high.light(kRed);
+    high.drawn();
+    for (const auto& [y, red] : {std::pair{0, true}, {1, false}, {4, false}, {5, true}})
+        EXPECT_EQ(high.canvas.pixel(8, y), red ? 0xFFFF0000U : 0xFFFFFFFFU) << y;
 }
 
 TEST(EditorLights, LevelsClosedToEditingAreDimmedOrHidden) {
-    Desk desk(kFixtureBulbs);
-    desk.addPoint(kPointBulb, 8, 3);
-    desk.addChannel(kRed);
+    Desk desk(kFixtureBulbs, {{8, 3}});
+    desk.light(kRed);
     desk.document->Levels[1].Edit_Enabled = false;
     EXPECT_EQ(desk.drawn(), "....................");
     desk.document->Dimmed = 40;  // level 102
@@ -139,19 +113,17 @@ TEST(EditorLights, LevelsClosedToEditingAreDimmedOrHidden) {
 }
 
 TEST(EditorLights, AFloodNeverPassesItsTopOpacity) {
-    Desk desk(kFixtureFlood);
+    Desk desk(kFixtureFlood, {{8, 3}});
     desk.fixture.BulbSize = 2;  // one ring, fully covered
     desk.fixture.Max_Opacity = 40;
-    desk.addPoint(kPointBulb, 8, 3);
-    desk.addChannel(kRed);
+    desk.light(kRed);
     desk.drawn();
     EXPECT_EQ(desk.canvas.pixel(8, 3), 0xFFFF9999U);
 }
 
 TEST(EditorLights, WrongNumbersFormatsAndSizesDrawNothing) {
-    Desk desk(kFixtureBulbs);
-    desk.addPoint(kPointBulb, 8, 3);
-    desk.addChannel(kRed);
+    Desk desk(kFixtureBulbs, {{8, 3}});
+    desk.light(kRed);
     desk.prepare();
     ZephDrawEditorLights(desk.context(), 0, desk.canvas);
     ZephDrawEditorLights(desk.context(), 2, desk.canvas);

@@ -1,20 +1,10 @@
 #include "engine/gl_shapes.h"
-
-#include <gtest/gtest.h>
-
-#include <array>
-#include <memory>
-#include <set>
+#include "tests/support/masks.h"
 
 namespace {
 
 const ZephGLShapes& shapes() {
-    static const std::unique_ptr<ZephGLShapes> made = [] {
-        auto all = std::make_unique<ZephGLShapes>();
-        ZephGLCreateShapes(*all);
-        return all;
-    }();
-    return *made;
+    return masks().GLShapes;
 }
 
 std::int32_t doubleArea(const ShapeVertex& a, const ShapeVertex& b, const ShapeVertex& c) {
@@ -61,21 +51,6 @@ TEST(GLShapes, PutsTheCirclePointsWhereTheAnglesLie) {
     EXPECT_EQ(shapes().ZephGLCircle[0][5], (ShapeVertex{0, 0}));
 }
 
-TEST(GLShapes, ClosesEveryOutline) {
-    constexpr std::array<std::size_t, kBulbShapes + 1> kCounts{0, 0, 4, 5, 6, 7, 9, 9, 11, 13, 17, 0};
-    for (std::size_t shape = 1; shape < kCounts.size(); ++shape) {
-        const GLOutlineTable& table = shapes().Outlines[shape];
-        EXPECT_EQ(table.VertexCount, kCounts[shape]) << shape;
-        for (std::size_t size = 1; size <= kMaxBulbSize && table.VertexCount > 0; ++size) {
-            EXPECT_EQ(table.Sizes[size][table.VertexCount - 1], table.Sizes[size][0]) << shape << " of size " << size;
-        }
-    }
-    // The grid of 32 on a box of 6: the apex at 15 comes to 2.8, cut off.
-    EXPECT_EQ(shapes().Outlines[2].Sizes[3][0], (ShapeVertex{2, 0}));
-    EXPECT_EQ(shapes().Outlines[2].Sizes[3][1], (ShapeVertex{6, 6}));
-    EXPECT_EQ(shapes().Outlines[3].Sizes[16][2], (ShapeVertex{32, 32}));
-}
-
 // Triangles that all turn the same way and together are as large as the outline neither overlap nor leave holes.
 TEST(GLShapes, FillsEveryOutlineOnce) {
     for (std::int32_t shape = 2; shape <= 10; ++shape) {
@@ -105,12 +80,4 @@ TEST(GLShapes, HasNoTrianglesForWhatCannotBeDrawn) {
         EXPECT_EQ(fillOf(shapes(), shape, size), nullptr) << shape << " of size " << size;
     EXPECT_TRUE(fillPolygonByTriangles({{0, 0}, {4, 4}, {2, 2}, {0, 0}}).Triangles.empty());
     EXPECT_TRUE(fillPolygonByTriangles({}).Triangles.empty());
-}
-
-TEST(GLShapes, LeavesNoCornerThatDoesNothing) {
-    // A square with a point in the middle of an edge, one twice, and a spike.
-    const GLFill fill = fillPolygonByTriangles({{0, 0}, {2, 0}, {4, 0}, {4, 0}, {4, 4}, {6, 4}, {4, 4}, {0, 4}});
-    EXPECT_EQ(fill.Corners.size(), 4U);
-    EXPECT_EQ(fill.Triangles.size(), 6U);
-    EXPECT_EQ(doubleArea(fill), 32);
 }

@@ -1,9 +1,6 @@
 #include "engine/render_table.h"
 #include "tests/support/engine_rig.h"
 
-#include <gmock/gmock.h>
-#include <gtest/gtest.h>
-
 #include <random>
 
 using testing::ElementsAre;
@@ -17,23 +14,33 @@ std::vector<std::int32_t> keys(const ZephRenderTables& tables) {
 std::vector<std::int32_t> fixturesOf(const ZephRenderTables& tables, std::size_t entry) {
     std::vector<std::int32_t> fixtures;
     const ZephRenderData& data = tables.RenderData[entry];
-    for (std::int32_t s = 0; s < data.SlotCount; ++s) {
+    for (std::int32_t s = 0; s < data.SlotCount; ++s)
         fixtures.push_back(tables.Slots[static_cast<std::size_t>(data.FirstSlot + s)].Fixture);
-    }
     return fixtures;
+}
+
+ZephChannel& addVirtual(ZephFixture& fixture, const std::string& name) {
+    ZephChannel& channel = addChannel(fixture, 0, 0);
+    channel.DeviceType = kDeviceNone;
+    channel.Name = name;
+    return channel;
+}
+
+// The n-th bulb of a channel, from 0.
+const ZephBulbLocation& bulb(const EngineRig& rig, int fixture, std::int32_t channel, std::int32_t n0) {
+    const ZephBulbLocations& places = *bulbLocations((*rig.states)[fixture], channel);
+    return rig.tables.BulbPool[static_cast<std::size_t>(places.First + n0)];
 }
 
 }  // namespace
 
 TEST(RenderTable, SortsKeysAndKeepsFixtureOrderWithinOne) {
     EngineRig rig;
-    rig.addPlain(2, 5);
-    rig.addPlain(1, 9);
-    rig.addPlain(2, 5);
-    rig.addChannel(1, 0, 1).DeviceType = kDeviceClearedInFile;
-    ZephChannel& dmx = rig.addChannel(2, 77, 12);
+    addChannel(rig.addPlain(2, 5), 0, 1).DeviceType = kDeviceClearedInFile;
+    ZephChannel& dmx = addChannel(rig.addPlain(1, 9), 77, 12);
     dmx.DeviceType = kDeviceDmx;
     dmx.Network = 5;
+    rig.addPlain(2, 5);
     rig.build();
     EXPECT_THAT(keys(rig.tables), ElementsAre(-99'999'999, 100'001'009, 100'002'005, 700'500'012));
     EXPECT_THAT(fixturesOf(rig.tables, 3), ElementsAre(1, 3));
@@ -41,6 +48,12 @@ TEST(RenderTable, SortsKeysAndKeepsFixtureOrderWithinOne) {
     EXPECT_EQ(rig.tables.RenderDataCount, 4);
     EXPECT_EQ(FindCommandData(BuildCmdKey(kDeviceDmx, 5, 123, 12), rig.tables), 4) << "the unit takes no part";
     EXPECT_EQ(FindCommandData(100'002'006, rig.tables), 0);
+    EXPECT_THAT(rig.host.panel2History,
+                ElementsAre("Reset Rendering Parms", "Building Virtual Keys", "Building Virtual Keys",
+                            "Building Virtual Keys", "Compiling Master/Slave Keshs",
+                            "Compiling Master/Slave Pixel Universes", "Creating Channel Table for Fixture-1",
+                            "Creating Channel Table for Fixture-2", "Creating Channel Table for Fixture-3",
+                            "Pre-build all bulb locations", "Finishing up"));
 }
 
 TEST(RenderTable, KeepsSixteenFixturesOfAKeyAndNumbersGroupsByWhatItKeeps) {
@@ -56,10 +69,10 @@ TEST(RenderTable, KeepsSixteenFixturesOfAKeyAndNumbersGroupsByWhatItKeeps) {
 
 TEST(RenderTable, ReportsKeysThatDoNotFitOnceAndClearedDevicesStayNegative) {
     EngineRig rig;
-    rig.addPlain(1, 1);
-    rig.addChannel(1, 2'000'000'000, 1);
-    rig.addChannel(1, 2'000'000'000, 2);
-    ZephChannel& cleared = rig.addChannel(1, 0, 0);
+    ZephFixture& fixture = rig.addPlain(1, 1);
+    addChannel(fixture, 2'000'000'000, 1);
+    addChannel(fixture, 2'000'000'000, 2);
+    ZephChannel& cleared = addChannel(fixture, 0, 0);
     cleared.DeviceType = kDeviceCleared;
     cleared.Network = 300;
     rig.build();
@@ -69,35 +82,19 @@ TEST(RenderTable, ReportsKeysThatDoNotFitOnceAndClearedDevicesStayNegative) {
 
 TEST(RenderTable, SaysWhenThereIsNothingToSimulate) {
     EngineRig rig;
-    rig.addFixture(kFixtureStrings);
+    rig.add(kFixtureStrings);
     rig.build();
     EXPECT_EQ(rig.tables.RenderDataCount, 0);
-    ASSERT_EQ(rig.host.boxes.size(), 1u);
-    EXPECT_EQ(rig.host.boxes[0].title, "Qen Visualizer-Error");
-    EXPECT_EQ(rig.host.boxes[0].text, "There are no channels to simulate.");
+    EXPECT_EQ(rig.host.boxTexts(), "Qen Visualizer-Error|There are no channels to simulate.");
     EXPECT_EQ(rig.host.boxes[0].icon, BoxIcon::Critical);
-}
-
-TEST(RenderTable, TellsItsStepsInTheStatusBar) {
-    EngineRig rig;
-    rig.addPlain(1, 1);
-    rig.build();
-    EXPECT_THAT(rig.host.panel2History,
-                ElementsAre("Reset Rendering Parms", "Building Virtual Keys", "Compiling Master/Slave Keshs",
-                            "Compiling Master/Slave Pixel Universes", "Creating Channel Table for Fixture-1",
-                            "Pre-build all bulb locations", "Finishing up"));
 }
 
 TEST(VirtualChannels, AreFoundInAnyCaseAndTheEmptyNameCounts) {
     EngineRig rig;
-    const int f = rig.addFixture(kFixtureStrings);
-    for (const char* name : {"roof", "ARCH", "Roof", "", "Ärch"}) {
-        ZephChannel& channel = rig.addChannel(f, 0, 0);
-        channel.DeviceType = kDeviceNone;
-        channel.Name = name;
-    }
+    ZephFixture& fixture = rig.add(kFixtureStrings);
+    for (const char* name : {"roof", "ARCH", "Roof", "", "Ärch"})
+        addVirtual(fixture, name);
     rig.build();
-    EXPECT_EQ(rig.tables.VirtualChannelCount, 4);
     EXPECT_EQ(ZephReturnVirtualChannelKey("", rig.tables), 1);
     EXPECT_EQ(ZephReturnVirtualChannelKey("arch", rig.tables), 2);
     EXPECT_EQ(ZephReturnVirtualChannelKey("ROOF", rig.tables), 3);
@@ -109,55 +106,45 @@ TEST(VirtualChannels, AreFoundInAnyCaseAndTheEmptyNameCounts) {
 
 TEST(VirtualChannels, TheCallAfter255WarnsOnceEvenWithAKnownName) {
     EngineRig rig;
-    int f = 0;
     for (int n = 1; n <= 257; ++n) {
-        if (n % 16 == 1) f = rig.addFixture(kFixtureStrings);
-        ZephChannel& channel = rig.addChannel(f, 0, 0);
-        channel.DeviceType = kDeviceNone;
-        channel.Name = "v" + std::to_string(n > 255 ? 1 : n);
+        if (n % 16 == 1) rig.add(kFixtureStrings);
+        addVirtual(rig.simulation->Fixtures[rig.simulation->FixtureCount], "v" + std::to_string(n > 255 ? 1 : n));
     }
     rig.build();
-    ASSERT_EQ(rig.host.boxes.size(), 1u);
-    EXPECT_EQ(rig.host.boxes[0].title, "Qen Visualizer-Max Virtual Channels");
-    EXPECT_EQ(rig.host.boxes[0].text,
-              "You have 255 or more virtual channels.\r\nOnly the first 255 will be simulated.");
+    EXPECT_EQ(rig.host.boxTexts(), "Qen Visualizer-Max Virtual Channels|You have 255 or more virtual channels.\r\nOnly "
+                                   "the first 255 will be simulated.");
     EXPECT_EQ(rig.tables.VirtualChannelCount, 255);
 }
 
 TEST(RibbonSlots, LegacySpreadsOverTenUnitsAndMagicChannelsEndTheRow) {
     EngineRig rig;
-    const int f = rig.addRibbon(3);
-    rig.simulation->Fixtures[f].Kesh.Unit_Mode = 1;
+    rig.addRibbon(3).Kesh.Unit_Mode = 1;
     rig.build();
     EXPECT_EQ(rig.tables.RenderDataCount, 157);
     EXPECT_EQ(rig.tables.Keys[1], 100'003'001);
     EXPECT_EQ(rig.tables.Keys[157], 100'012'013);
-    const ZephRenderSlot& magic = rig.tables.Slots.back();
-    EXPECT_EQ(magic.KeshMagic, 157);
-    EXPECT_FALSE(magic.isRGB());
+    EXPECT_EQ(rig.tables.Slots.back().KeshMagic, 157);
+    EXPECT_FALSE(rig.tables.Slots.back().isRGB());
     EXPECT_EQ(rig.tables.RGBData.size() - 1, 50u);
 }
 
 TEST(RibbonSlots, SequentialAtACoarseResolutionHasColoursAboveThree) {
     EngineRig rig;
-    const int f = rig.addRibbon(3);
-    rig.simulation->Fixtures[f].Kesh.Channel_Mode = 1;
-    rig.simulation->Fixtures[f].Kesh.Resolution = 3;
+    ZephKeshData& ribbon = rig.addRibbon(3).Kesh;
+    ribbon.Channel_Mode = 1;
+    ribbon.Resolution = 3;
     rig.build();
     const ZephRenderSlot& slot = rig.tables.Slots[48];  // the 49th channel, groups of 16
     EXPECT_EQ(slot.Channel, 4);
     EXPECT_EQ(slot.Triplet, 1);
     EXPECT_EQ(rig.tables.RGBData.size() - 1, 16u);
     rig.command(3, 49, 0, 100);
-    rig.pass(9);  // a slot without a place in its group: nothing is drawn, nothing is touched
-    EXPECT_TRUE(rig.surface.groups.empty());
+    EXPECT_EQ(rig.shown({9}), "") << "a slot without a place in its group";
 }
 
 TEST(PixelSlots, CountThreeChannelsAPointFrom1001) {
     EngineRig rig;
-    const int f = rig.addFixture(kFixtureDmxPixels, 4);
-    rig.simulation->Fixtures[f].Channel_Type = kChannelRgb;
-    rig.simulation->Fixtures[f].DMX.Universe = 2;
+    rig.addPixels(2, 4);
     rig.build();
     EXPECT_EQ(rig.tables.RenderDataCount, 12);
     EXPECT_EQ(rig.tables.Keys[12], 700'200'012);
@@ -168,27 +155,22 @@ TEST(PixelSlots, CountThreeChannelsAPointFrom1001) {
 
 TEST(BulbPlaces, StringsRoundAndSinglePointsAreCutOff) {
     EngineRig rig;
-    const int string = rig.addFixture(kFixtureStrings);
-    rig.simulation->Fixtures[string].DrawPoints[1] = {kPointMove, 22, 15};  // 1.47 pixels
-    rig.simulation->Fixtures[string].DrawPoints[2] = {kPointLine, 23 + 30 * 15, 15};
-    rig.simulation->Fixtures[string].BulbSpacing = 6;
-    rig.simulation->Fixtures[string].BulbSize = 2;
-    rig.addChannel(string, 1, 1);
-    rig.addChannel(string, 1, 2);
-    const int flood = rig.addFixture(kFixtureFlood, 1);
-    rig.simulation->Fixtures[flood].DrawPoints[1] = {kPointBulb, 29, -16};
-    rig.addChannel(flood, 1, 3);
+    ZephFixture& string = rig.addPlain(1, 1);
+    addChannel(string, 1, 2);
+    string.DrawPoints[1] = {kPointMove, 22, 15};  // 1.47 pixels
+    string.DrawPoints[2] = {kPointLine, 23 + 30 * 15, 15};
+    string.BulbSpacing = 6;
+    ZephFixture& flood = rig.add(kFixtureFlood, {{0, 0}});
+    flood.DrawPoints[1] = {kPointBulb, 29, -16};
+    addChannel(flood, 1, 3);
     rig.build();
-    const ZephBulbLocations& first = (*rig.states)[string].BulbLocations[1];
-    const ZephBulbLocations& second = (*rig.states)[string].BulbLocations[2];
-    ASSERT_EQ(first.Count, 2);  // at 0 and 20 of the 31 pixels; the other channel at 10 and 30
-    ASSERT_EQ(second.Count, 2);
-    EXPECT_EQ(rig.tables.BulbPool[static_cast<std::size_t>(first.First + 1)].X, 21);
-    EXPECT_EQ(rig.tables.BulbPool[static_cast<std::size_t>(second.First)].X, 11);
-    const ZephBulbLocation& bulb =
-        rig.tables.BulbPool[static_cast<std::size_t>((*rig.states)[flood].BulbLocations[1].First)];
-    EXPECT_EQ(bulb.X, 1);
-    EXPECT_EQ(bulb.Y, -1);
+    // At 0 and 20 of the 31 pixels, and the other channel at 10 and 30.
+    EXPECT_EQ(bulbLocations((*rig.states)[1], 1)->Count, 2);
+    EXPECT_EQ(bulbLocations((*rig.states)[1], 2)->Count, 2);
+    EXPECT_EQ(bulb(rig, 1, 1, 1).X, 21);
+    EXPECT_EQ(bulb(rig, 1, 2, 0).X, 11);
+    EXPECT_EQ(bulb(rig, 2, 1, 0).X, 1);
+    EXPECT_EQ(bulb(rig, 2, 1, 0).Y, -1);
 }
 
 TEST(KeySearch, BothFormsFindWhatABisectionFinds) {
@@ -213,10 +195,8 @@ TEST(KeySearch, BothFormsFindWhatABisectionFinds) {
         std::vector<std::int32_t> found(probes.size());
         search.findMany(probes, found.data());
         for (std::size_t i = 0; i < probes.size(); ++i) {
-            const auto place = std::lower_bound(sorted.begin(), sorted.end(), probes[i]);
-            const std::int32_t expected = place != sorted.end() && *place == probes[i]
-                                              ? static_cast<std::int32_t>(place - sorted.begin()) + 1
-                                              : 0;
+            const auto [first, last] = std::equal_range(sorted.begin(), sorted.end(), probes[i]);
+            const auto expected = first == last ? 0 : static_cast<std::int32_t>(first - sorted.begin()) + 1;
             ASSERT_EQ(found[i], expected) << count << " keys, probe " << probes[i];
             ASSERT_EQ(search.findPortable(probes[i]), expected) << count << " keys, probe " << probes[i];
         }

@@ -1,8 +1,6 @@
 // Windows need the application before the first test.
 #include <QApplication>
 
-#include <gtest/gtest.h>
-
 int main(int argc, char** argv) {
     testing::InitGoogleTest(&argc, argv);
     const QApplication application(argc, argv);

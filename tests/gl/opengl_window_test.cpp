@@ -11,8 +11,6 @@
 #include <QTest>
 #include <QWindow>
 
-#include <gtest/gtest.h>
-
 namespace {
 
 struct OpenGLWindow : testing::Test {
@@ -25,17 +23,14 @@ struct OpenGLWindow : testing::Test {
 
     // A canvas of 300 x 200 with a red square of 20 x 20 in the middle, on blue.
     void SetUp() override {
-        stage.background = QImage(300, 200, QImage::Format_RGB32);
-        stage.background.fill(QColor(0, 0, 120));
-        ZephFixture& bulb = stage.add(kFixtureBulbs, kChannelNormal, 10, 3);
-        bulb.Channels[1].Color = packColor(255, 0, 0);
-        Stage::addPoint(bulb, kPointBulb, 150, 100);
+        stage.blank(300, 200, qRgb(0, 0, 120));
+        stage.addLit(kFixtureBulbs, 10, 3, {{150, 100}}, packColor(255, 0, 0));
         stage.finish();
         ASSERT_TRUE(ZephCreateRenderWindow(stage.background.size(), failures, window));
         window.move(100, 80);
         ASSERT_TRUE(QTest::qWaitForWindowExposed(&window));
         ASSERT_TRUE(surface.ZephGLStartup(
-            {*stage.document, stage.tables, *stage.states, curve, masks().GLShapes, stage.background, 100, 300, 200},
+            {*stage.simulation, stage.tables, *stage.states, curve, masks().GLShapes, stage.background, 100, 300, 200},
             window.target(), failures));
         window.resizeDrawing();
     }

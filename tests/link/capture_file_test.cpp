@@ -1,29 +1,20 @@
 #include "link/capture_file.h"
+#include "tests/support/folder.h"
 #include "util/failure.h"
-
-#include <QTemporaryDir>
-
-#include <gmock/gmock.h>
-#include <gtest/gtest.h>
-
-#include <fstream>
-#include <sstream>
 
 namespace {
 
-std::string failureOf(std::string_view text) {
+std::string failureOf(const std::function<void()>& work) {
     try {
-        (void)parseCapture(text);
+        work();
     } catch (const Failure& failure) {
         return failure.what();
     }
     return "";
 }
 
-std::string contentOf(const std::string& path) {
-    std::ostringstream text;
-    text << std::ifstream(path, std::ios::binary).rdbuf();
-    return text.str();
+std::string failureOf(std::string_view text) {
+    return failureOf([&] { (void)parseCapture(text); });
 }
 
 }  // namespace
@@ -79,37 +70,28 @@ TEST(CaptureFile, ALastLineThatWasCutIsLeftOutAndTold) {
 }
 
 TEST(CaptureFile, EveryByteSurvivesWritingAndReading) {
-    QTemporaryDir folder;
-    const std::string path = folder.filePath("all.zcap").toStdString();
+    const Folder folder;
     std::string all;
     for (int code = 0; code < 256; ++code)
         all += static_cast<char>(code);
+    const std::string frame = "\x01" + std::string("0000007\x04");
     {
-        CaptureWriter writer(path);
-        writer.piece(0, "\x01"
-                        "0000007\x04");
-        EXPECT_EQ(contentOf(path), "zeph-capture 1\n0 \\x010000007\\x04\n");  // readable while it is still written
+        CaptureWriter writer(folder.path("all.zcap"));
+        writer.piece(0, frame);
+        EXPECT_EQ(folder.read("all.zcap"), "zeph-capture 1\n0 \\x010000007\\x04\n");  // readable while being written
         writer.piece(7, all);
         EXPECT_THROW(writer.piece(6, "x"), Failure);
     }
-    EXPECT_EQ(loadCapture(path).pieces, (std::vector<CapturePiece>{{0, "\x01"
-                                                                       "0000007\x04"},
-                                                                   {7, all}}));
+    EXPECT_EQ(loadCapture(folder.path("all.zcap")).pieces, (std::vector<CapturePiece>{{0, frame}, {7, all}}));
 }
 
 TEST(CaptureFile, AFileThatCannotBeUsedIsNamed) {
-    QTemporaryDir folder;
-    const std::string missing = folder.filePath("none/x.zcap").toStdString();
-    EXPECT_THROW(loadCapture(missing), Failure);
-    EXPECT_THROW(CaptureWriter{missing}, Failure);
-    EXPECT_THROW(loadCapture(folder.path().toStdString()), Failure);
+    const Folder folder;
+    EXPECT_THROW(loadCapture(folder.path("none/x.zcap")), Failure);
+    EXPECT_THROW(CaptureWriter(folder.path("none/x.zcap")), Failure);
+    EXPECT_THROW(loadCapture(folder.path()), Failure);
     EXPECT_THROW(CaptureWriter("/dev/full"), Failure);
-    const std::string bad = folder.filePath("bad.zcap").toStdString();
-    std::ofstream(bad) << "zeph-capture 1\nx\n";
-    try {
-        (void)loadCapture(bad);
-        FAIL();
-    } catch (const Failure& failure) {
-        EXPECT_THAT(failure.what(), testing::StartsWith(bad + ", line 2: "));
-    }
+    folder.write("bad.zcap", "zeph-capture 1\nx\n");
+    EXPECT_EQ(failureOf([&] { (void)loadCapture(folder.path("bad.zcap")); }).find(folder.path("bad.zcap, line 2: ")),
+              0u);
 }

@@ -4,8 +4,6 @@
 #include "tests/support/recording_sink.h"
 #include "util/random_source.h"
 
-#include <gtest/gtest.h>
-
 namespace {
 
 std::string digits(SeededRandom& random, std::int32_t low, std::int32_t high, std::size_t width) {
@@ -53,16 +51,10 @@ void mutate(SeededRandom& random, std::string& text) {
     constexpr std::string_view bytes("\x01\x04 .0123459/:+-aG\xFF\x00", 20);
     const auto at = static_cast<std::size_t>(ZephReturnRandomNumber(0, static_cast<int>(text.size()) - 1, random));
     const char byte = bytes[static_cast<std::size_t>(ZephReturnRandomNumber(0, 19, random))];
-    switch (ZephReturnRandomNumber(0, 7, random)) {
-    case 0:
-        text.erase(at, 1);
-        break;
-    case 1:
-        text.insert(at, 1, byte);
-        break;
-    default:
-        text[at] = byte;  // most often, since the length stays right and the payloads are read
-    }
+    // Most often changed, since the length then stays right and the payloads are read.
+    const std::int32_t kind = ZephReturnRandomNumber(0, 7, random);
+    if (kind != 1) text.erase(at, 1);
+    if (kind != 0) text.insert(at, 1, byte);
 }
 
 }  // namespace
@@ -96,15 +88,12 @@ TEST(ParserForms, EveryFormReadsRandomAndDamagedStreamsAsThePlainParserDoes) {
             sink.commands.clear();
             plainSink.commands.clear();
         }
-        for (const auto& [universe, levels] : plain.dmxDumps) {
-            const auto stored = stream.Dumps.ZephDmxDumpTable.levels(universe);
-            EXPECT_EQ(std::string(stored.begin(), stored.end()), levels);
-        }
-        for (const auto& [address, levels] : plain.controllerDumps) {
-            const auto stored =
-                stream.Dumps.ZephControllerDumpTable.levels(controllerSlot(address.first, address.second));
-            EXPECT_EQ(std::string(stored.begin(), stored.end()), levels);
-        }
+        const auto bytes = [](const auto& stored) { return std::string(stored.begin(), stored.end()); };
+        const LevelDumps& dumps = stream.Dumps;
+        for (const auto& [universe, levels] : plain.dmxDumps)
+            EXPECT_EQ(bytes(dumps.ZephDmxDumpTable.levels(universe)), levels);
+        for (const auto& [at, levels] : plain.controllerDumps)
+            EXPECT_EQ(bytes(dumps.ZephControllerDumpTable.levels(controllerSlot(at.first, at.second))), levels);
         EXPECT_GT(commands, 50'000u);  // the damage must not have hidden the payloads
     }
 }

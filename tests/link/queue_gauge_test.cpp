@@ -1,8 +1,6 @@
 #include "link/queue_gauge.h"
 #include "util/color.h"
 
-#include <gtest/gtest.h>
-
 TEST(QueueGauge, ColoursByRatioAndSendsAColourOnlyWhenItChanges) {
     constexpr std::int32_t green = packColor(0, 255, 0);
     constexpr std::int32_t yellow = packColor(255, 255, 0);

@@ -4,8 +4,6 @@
 #include <QLocalServer>
 #include <QLocalSocket>
 
-#include <gtest/gtest.h>
-
 #include <thread>
 
 using namespace std::string_literals;
@@ -14,10 +12,8 @@ TEST(SequencerMessage, CarriesItsTextIn16BitCharactersWithoutATerminator) {
     EXPECT_EQ(sequencerText(SequencerCommand::Start), "15<SEQVIS>START");
     EXPECT_EQ(sequencerText(SequencerCommand::Stop), "15<SEQVIS>STOP");
     EXPECT_EQ(sequencerRecord("AB"), "\3\0\0\0\4\0\0\0A\0B\0"s);
-    EXPECT_EQ(sequencerCode(1), "01");
-    EXPECT_EQ(sequencerCode(10), "10");
-    EXPECT_EQ(sequencerCode(0), "00");
-    EXPECT_EQ(sequencerCode(100), "00");
+    for (const auto& [number, code] : {std::pair{1, "01"}, {10, "10"}, {0, "00"}, {100, "00"}})
+        EXPECT_EQ(sequencerCode(number), code);
 }
 
 TEST(SequencerMessage, IsTakenOffInPiecesAndOneByOne) {
@@ -48,7 +44,7 @@ TEST(SequencerMessage, ReachesWhoeverListensAndSaysSoWhenNobodyDoes) {
     const QString name = QString::fromStdString(sequencerSocketName(pid));
     QLocalServer::removeServer(name);
     ASSERT_TRUE(server.listen(name));
-    std::thread sender([&] { EXPECT_TRUE(sendToSequencer(pid, SequencerCommand::Start)); });
+    std::jthread sender([&] { EXPECT_TRUE(sendToSequencer(pid, SequencerCommand::Start)); });
     ASSERT_TRUE(server.waitForNewConnection(5000));
     QLocalSocket* const client = server.nextPendingConnection();
     std::string arrived;
@@ -56,6 +52,5 @@ TEST(SequencerMessage, ReachesWhoeverListensAndSaysSoWhenNobodyDoes) {
     while (!(text = takeSequencerRecord(arrived)) && client->waitForReadyRead(5000)) {
         arrived += client->readAll().toStdString();
     }
-    sender.join();
     EXPECT_EQ(text, "15<SEQVIS>START");
 }

@@ -10,8 +10,6 @@
 #include <QTcpSocket>
 #include <QUdpSocket>
 
-#include <gtest/gtest.h>
-
 #include <chrono>
 #include <thread>
 

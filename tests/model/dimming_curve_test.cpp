@@ -1,8 +1,5 @@
 #include "model/dimming_curve.h"
 #include "tests/support/loading.h"
-#include "util/whole_file.h"
-
-#include <gtest/gtest.h>
 
 namespace {
 
@@ -27,44 +24,33 @@ TEST(DimmingCurve, EveryChildSetsOneByteWhateverItsName) {
 }
 
 TEST(DimmingCurve, FailuresAreReportedInTheGivenWords) {
-    struct Case {
-        const char* what;
-        std::string text;
-        const char* description;
+    const std::string invalid = "The Dimming Curve file is invalid or corrupted.";
+    const std::string noBody = "Could Not load the dimming curve's body.";
+    const auto body = [](const char* attributes) {
+        return curveFile("<Dimming_Curve><P " + std::string(attributes) + "/></Dimming_Curve>");
     };
-    const Case cases[] = {
-        {"empty", "", "The Dimming Curve file is invalid or corrupted."},
-        {"cut off", "<ZephDimCurve zephSaveFileVersion=\"1.5.0\"><Dimming_Curve>",
-         "The Dimming Curve file is invalid or corrupted."},
-        {"another root", "<Zeph zephSaveFileVersion=\"1.5.0\"/>",
-         "This is not a valid Dimming Curve for this application."},
-        {"another version", "<ZephDimCurve zephSaveFileVersion=\"3.0.0\"/>",
+    const std::pair<std::string, std::string> cases[] = {
+        {"", invalid},
+        {"<ZephDimCurve zephSaveFileVersion=\"1.5.0\"><Dimming_Curve>", invalid},
+        {"<Zeph zephSaveFileVersion=\"1.5.0\"/>", "This is not a valid Dimming Curve for this application."},
+        {"<ZephDimCurve zephSaveFileVersion=\"3.0.0\"/>",
          "The File Version for the dimming curve is incompatible for this application."},
-        {"no body", curveFile(""), "Could Not load the dimming curve's body."},
-        {"value 256", curveFile("<Dimming_Curve><P ID=\"1\" Value=\"256\"/></Dimming_Curve>"),
-         "Could Not load the dimming curve's body."},
-        {"ID 256", curveFile("<Dimming_Curve><P ID=\"256\" Value=\"1\"/></Dimming_Curve>"),
-         "Could Not load the dimming curve's body."},
-        {"negative", curveFile("<Dimming_Curve><P ID=\"1\" Value=\"-1\"/></Dimming_Curve>"),
-         "Could Not load the dimming curve's body."},
-        {"no value", curveFile("<Dimming_Curve><P ID=\"1\"/></Dimming_Curve>"),
-         "Could Not load the dimming curve's body."},
+        {curveFile(""), noBody},
+        {body("ID=\"1\" Value=\"256\""), noBody},
+        {body("ID=\"256\" Value=\"1\""), noBody},
+        {body("ID=\"1\" Value=\"-1\""), noBody},
+        {body("ID=\"1\""), noBody},
     };
-    for (const Case& row : cases) {
-        SCOPED_TRACE(row.what);
-        LoadBench bench;
-        ZephDimmingCurve curve;
-        ASSERT_TRUE(replaceWholeFile(bench.path(), row.text));
-        EXPECT_FALSE(ZephLoadDimmingCurveXML(bench.path(), bench.failures, curve));
-        ASSERT_FALSE(bench.failures.reports.empty());
-        EXPECT_EQ(bench.failures.reports.back().description, row.description);
-        EXPECT_EQ(bench.failures.reports.back().procedure, "Zeph.modZephLoadSave.ZephLoadDimmingCurveXML");
-    }
     LoadBench bench;
     ZephDimmingCurve curve;
-    EXPECT_FALSE(ZephLoadDimmingCurveXML(bench.folderPath + "none.xml", bench.failures, curve));
-    EXPECT_FALSE(ZephLoadDimmingCurveXML(bench.folderPath, bench.failures, curve)) << "a folder is no file";
-    ASSERT_EQ(bench.failures.reports.size(), 2u);
-    for (const auto& report : bench.failures.reports)
-        EXPECT_EQ(report.description, "The Dimming Curve file is missing or invalid.");
+    for (const auto& [text, description] : cases) {
+        bench.folder.write("curve.xml", text.c_str());
+        EXPECT_FALSE(ZephLoadDimmingCurveXML(bench.folder.path("curve.xml"), bench.failures, curve)) << text;
+        EXPECT_EQ(bench.failures.reports.back().description, description) << text;
+        EXPECT_EQ(bench.failures.reports.back().procedure, "Zeph.modZephLoadSave.ZephLoadDimmingCurveXML");
+    }
+    for (const char* name : {"none.xml", ""}) {  // a folder is no file
+        EXPECT_FALSE(ZephLoadDimmingCurveXML(bench.folder.path(name), bench.failures, curve));
+        EXPECT_EQ(bench.failures.reports.back().description, "The Dimming Curve file is missing or invalid.");
+    }
 }

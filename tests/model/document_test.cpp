@@ -2,11 +2,10 @@
 #include "model/data_directories.h"
 #include "model/document.h"
 #include "model/tables.h"
+#include "tests/support/fixtures.h"
 #include "tests/support/loading.h"
 
-#include <gtest/gtest.h>
-
-#include <algorithm>
+using testing::ElementsAre;
 
 namespace {
 
@@ -22,6 +21,16 @@ struct Display {
         for (int p = 1; p <= props; ++p)
             simulation->Props[p].Name = "P" + std::to_string(p);
     }
+    std::vector<int> members(int prop) const {
+        const ZephProp& record = simulation->Props[prop];
+        return {record.Object.begin(), record.Object.begin() + record.AssignedCount};
+    }
+    std::string names() const {
+        std::string all;
+        for (int f = 1; f <= simulation->FixtureCount; ++f)
+            all += (f > 1 ? " " : "") + simulation->Fixtures[f].Name;
+        return all;
+    }
 };
 
 }  // namespace
@@ -32,9 +41,7 @@ TEST(Props, AFixtureAddedToAFullPropPointsAtItButIsNotListed) {
         EXPECT_TRUE(ZephAddFixtureToProp(f, 1, *display.simulation));
     EXPECT_TRUE(ZephAddFixtureToProp(64, 1, *display.simulation)) << "a second time changes nothing";
     EXPECT_FALSE(ZephAddFixtureToProp(65, 1, *display.simulation));
-    const ZephProp& prop = display.simulation->Props[1];
-    EXPECT_EQ(prop.AssignedCount, 64);
-    EXPECT_EQ(prop.Object[64], 64);
+    EXPECT_EQ(display.members(1).size(), 64u);
     EXPECT_EQ(display.simulation->Fixtures[65].AssignedItem, 1);
     EXPECT_EQ(display.simulation->Fixtures[65].AssignedItemName, "P1");
 }
@@ -50,7 +57,7 @@ TEST(Props, AMissMarksTheDocumentDirtyAndKeepsTheAssignment) {
     EXPECT_FALSE(ZephDisassociateFromProp(2, 1, *display.simulation));
     EXPECT_EQ(display.simulation->Fixtures[2].AssignedItem, 0);
     EXPECT_TRUE(ZephDeleteFixtureFromProp(1, 1, *display.simulation));
-    EXPECT_EQ(display.simulation->Props[1].AssignedCount, 0);
+    EXPECT_THAT(display.members(1), ElementsAre());
 }
 
 TEST(Deleting, AFixtureRenumbersEveryMemberAboveIt) {
@@ -58,29 +65,22 @@ TEST(Deleting, AFixtureRenumbersEveryMemberAboveIt) {
     for (const int f : {4, 5, 6, 10})
         ZephAddFixtureToProp(f, 2, *display.simulation);
     ZephDeleteThisFixture(5, false, *display.simulation, display.watcher);
-    const ZephProp& prop = display.simulation->Props[2];
-    EXPECT_EQ(prop.AssignedCount, 3);
-    EXPECT_EQ(prop.Object[1], 4);
-    EXPECT_EQ(prop.Object[2], 5);
-    EXPECT_EQ(prop.Object[3], 9);
-    EXPECT_EQ(display.simulation->FixtureCount, 9);
-    EXPECT_EQ(display.simulation->Fixtures[5].Name, "F6");
+    EXPECT_THAT(display.members(2), ElementsAre(4, 5, 9));
+    EXPECT_EQ(display.names(), "F1 F2 F3 F4 F6 F7 F8 F9 F10");
     EXPECT_EQ(display.simulation->Fixtures[5].AssignedItem, 2);
     EXPECT_EQ(display.simulation->Fixtures[10].Name, "") << "the freed record is cleared";
-    EXPECT_EQ(display.watcher.removed, std::vector<int>{5});
+    EXPECT_THAT(display.watcher.removed, ElementsAre(5));
 }
 
 TEST(Deleting, APropMovesTheLaterOnesDownAndFreesItsMembers) {
     Display display(3, 3);
-    ZephAddFixtureToProp(1, 1, *display.simulation);
-    ZephAddFixtureToProp(2, 2, *display.simulation);
-    ZephAddFixtureToProp(3, 3, *display.simulation);
+    for (const int n : {1, 2, 3})
+        ZephAddFixtureToProp(n, n, *display.simulation);
     EXPECT_TRUE(ZephDeleteThisProp(2, *display.simulation));
     EXPECT_EQ(display.simulation->PropCount, 2);
     EXPECT_EQ(display.simulation->Props[2].Name, "P3");
-    EXPECT_EQ(display.simulation->Fixtures[1].AssignedItem, 1);
-    EXPECT_EQ(display.simulation->Fixtures[2].AssignedItem, 0);
-    EXPECT_EQ(display.simulation->Fixtures[3].AssignedItem, 2);
+    for (const auto& [fixture, prop] : {std::pair{1, 1}, {2, 0}, {3, 2}})
+        EXPECT_EQ(display.simulation->Fixtures[fixture].AssignedItem, prop);
     EXPECT_EQ(display.simulation->Fixtures[3].AssignedItemName, "P3");
 }
 
@@ -89,24 +89,21 @@ TEST(Deleting, ByPropEmptiesThePropAndRebuildsTheListOnce) {
     for (const int f : {2, 4, 5})
         ZephAddFixtureToProp(f, 1, *display.simulation);
     EXPECT_TRUE(ZephDeleteFixturesByProp(4, *display.simulation, display.watcher));
-    EXPECT_EQ(display.simulation->FixtureCount, 2);
-    EXPECT_EQ(display.simulation->Fixtures[1].Name, "F1");
-    EXPECT_EQ(display.simulation->Fixtures[2].Name, "F3");
+    EXPECT_EQ(display.names(), "F1 F3");
     EXPECT_EQ(display.simulation->PropCount, 1);
     EXPECT_EQ(display.watcher.lists, 1);
 }
 
 TEST(Reset, KeepsTheEditStateOnRequest) {
     Display display(3, 1);
-    display.simulation->SimulationOpen = display.simulation->SimulationDirty = true;
+    display.simulation->SimulationOpen = true;
     display.simulation->Dimmed = 50;
     ZephGlobalReset(true, *display.simulation, display.watcher);
     EXPECT_TRUE(display.simulation->SimulationOpen);
-    EXPECT_EQ(display.watcher.selections, 0);
-    EXPECT_EQ(display.simulation->FixtureCount, 0);
+    EXPECT_EQ(display.watcher.selections + display.watcher.clipboards, 0);
     EXPECT_EQ(display.simulation->Fixtures[1], ZephFixture{});
     EXPECT_EQ(display.simulation->Levels[1].Name, "Level 1");
-    EXPECT_EQ(display.simulation->Dimmed, 0);
+    EXPECT_EQ(display.simulation->Dimmed + display.simulation->FixtureCount, 0);
     ZephGlobalReset(false, *display.simulation, display.watcher);
     EXPECT_FALSE(display.simulation->SimulationOpen);
     EXPECT_EQ(display.watcher.clipboards, 1);
@@ -122,33 +119,27 @@ TEST(NewFixtureName, IsTheFirstFreeOneByExactCase) {
 TEST(FixturesPerChannel, WarnsAtSixteenInTheGivenWords) {
     Display display(16, 0);
     ZephFixture edited;
-    edited.ChannelCount = 2;
-    edited.Channels[2].Name = "Roof";
-    edited.Channels[2].DeviceType = kDeviceQen;
-    edited.Channels[2].Network = 2;
-    edited.Channels[2].Controller = 3;
-    edited.Channels[2].Channel = 4;
+    addChannel(edited, 0, 0);
+    ZephChannel& channel = addChannel(edited, 3, 4);
+    channel.Name = "Roof";
+    channel.Network = 2;
     // The bound of the search is the count of fixture 2, since the channel in question is the second.
     display.simulation->Fixtures[2].ChannelCount = 1;
     for (int f = 1; f <= 15; ++f)
-        display.simulation->Fixtures[f].Channels[1] = edited.Channels[2];
+        display.simulation->Fixtures[f].Channels[1] = channel;
     RecordingHost host;
     ZephCheckFixturesPerChannel(*display.simulation, edited, host);
-    EXPECT_TRUE(host.boxes.empty());
+    EXPECT_EQ(host.boxTexts(), "");
 
-    display.simulation->Fixtures[1000].Channels[1] = edited.Channels[2];  // beyond the count, and still counted
+    display.simulation->Fixtures[1000].Channels[1] = channel;  // beyond the count, and still counted
     ZephCheckFixturesPerChannel(*display.simulation, edited, host);
-    ASSERT_EQ(host.boxes.size(), 1u);
-    EXPECT_EQ(host.boxes[0].title, "Qen Visualizer-Max Simulation Fixtures");
-    EXPECT_EQ(host.boxes[0].text,
-              "This channel...\r\n\r\nName:Roof\r\nDevice:Qen\r\nNet:Aux B\r\nUnit:3\r\nCircuit:4\r\n\r\n"
-              "...is in use by more than 16 fixtures.\r\n\r\n"
-              "Your data will be saved, however only the first 16 fixtures will be simulated.");
-
+    EXPECT_EQ(host.boxTexts(), "Qen Visualizer-Max Simulation Fixtures|This channel...\r\n\r\nName:Roof\r\n"
+                               "Device:Qen\r\nNet:Aux B\r\nUnit:3\r\nCircuit:4\r\n\r\n"
+                               "...is in use by more than 16 fixtures.\r\n\r\n"
+                               "Your data will be saved, however only the first 16 fixtures will be simulated.");
     display.simulation->Fixtures[2].ChannelCount = 0;
-    host.boxes.clear();
     ZephCheckFixturesPerChannel(*display.simulation, edited, host);
-    EXPECT_TRUE(host.boxes.empty());
+    EXPECT_EQ(host.boxes.size(), 1u);
 }
 
 TEST(Identity, X10AddressesReadAsHouseAndUnit) {

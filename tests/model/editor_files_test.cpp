@@ -5,8 +5,6 @@
 #include "tests/support/loading.h"
 #include "util/message_host.h"
 
-#include <gtest/gtest.h>
-
 #include <filesystem>
 #include <fstream>
 
@@ -33,7 +31,7 @@ std::string flag(const char* name, bool value) {
 std::string outcome(std::string_view text, TextReading reading) {
     LoadBench bench;
     bench.simulation->FilePath = "";
-    std::string lines = flag("result", loadEditorText(text, reading, true, bench.context, *bench.simulation));
+    std::string lines = flag("result", bench.read(text, reading));
     lines += flag("upgraded", bench.simulation->FileUpgraded);
     lines += flag("mismatch", bench.simulation->ChecksumMismatch);
     lines += flag("led default", bench.simulation->FixtureLedDefault);
@@ -45,7 +43,7 @@ std::string outcome(std::string_view text, TextReading reading) {
         if (fixture.AssignedItem != 0) lines += "owner of " + fixture.Name + ": " + fixture.AssignedItemName + "\n";
     }
     lines += "document:\n" + editorText(*bench.simulation, bench.paths, "") + "\n";
-    return replaced(replaced(std::move(lines), bench.folderPath, "BASE/"), "\r\n", "\n");
+    return replaced(replaced(std::move(lines), bench.folder.path(), "BASE/"), "\r\n", "\n");
 }
 
 }  // namespace

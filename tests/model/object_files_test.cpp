@@ -1,12 +1,7 @@
-#include "model/editor_writer.h"
+#include "display.h"
 #include "model/object_files.h"
-#include "tests/support/limit_document.h"
+#include "tests/support/fixtures.h"
 #include "tests/support/loading.h"
-#include "util/whole_file.h"
-
-#include <QFile>
-
-#include <gtest/gtest.h>
 
 namespace {
 
@@ -21,21 +16,20 @@ struct ObjectBench : LoadBench {
     bool propText(std::string_view text) {
         return loadPropFileText(text, TextReading::QuickThenGeneral, context, *simulation, channelsSeen);
     }
-    std::string lastBox() const {
-        return host.boxes.empty() ? "" : host.boxes.back().title + "|" + host.boxes.back().text;
+    // What the boxes since the last call told, without the program's name.
+    std::string told() {
+        const std::string texts = host.boxTexts();
+        host.boxes.clear();
+        return texts.substr(std::min<std::size_t>(texts.size(), 14));
     }
 };
 
 ZephFixture sampleFixture(std::int32_t type) {
-    ZephFixture fixture;
-    InitializeFixture(ZephSettings(), fixture);
-    fixture.Fixture_Type = type;
+    const auto document = std::make_unique<ZephSimulation>();
+    ZephFixture& fixture = addFixture(*document, type, {{1, 2}, {-1, 3}});
+    fixture.Channel_Type = kChannelNormal;
     fixture.Name = "F & G";
-    fixture.ChannelCount = 1;
-    fixture.Channels[1].Name = "c";
-    fixture.PointCount = 2;
-    fixture.DrawPoints[1] = {kPointMove, 15, 30};
-    fixture.DrawPoints[2] = {kPointLine, -15, 45};
+    addChannel(fixture, 1, 2).Name = "c";
     return fixture;
 }
 
@@ -66,34 +60,20 @@ std::string file(std::string_view root, std::string_view version, const std::str
 
 }  // namespace
 
-TEST(ObjectFiles, AFixtureFileIsSpelledToTheLetter) {
-    const auto lines = [](std::string text) {
-        for (std::size_t at = text.find('\n'); at != std::string::npos; at = text.find('\n', at + 2))
-            text.insert(at, 1, '\r');
-        return text;
-    };
-    const std::string head =
-        "<?xml version='1.0' encoding='UTF-8'?>\n"
-        "<ZephFixture zephSaveFileVersion=\"3.0.0\" CreatedAt=\"today\">\n"
-        "    <DrawObjects>\n"
-        "        <DrawObject ID=\"1\" Name=\"F &amp; G\" BulbSize=\"2\" BulbSpacing=\"2\" Comment=\"\" BulbShape=\"1\" "
-        "ZOrder=\"1\" AssignedItem=\"0\" Locked=\"False\" Fixture_Type=\"";
-    const std::string sample = "\" Channel_Type=\"1\" Max_Opacity=\"50\">\n"
-                               "            <Sample Background_Color=\"0\" RGB_R=\"0\" RGB_G=\"0\" RGB_B=\"0\"/>\n";
-    const std::string tail = "            <DrawPoints>\n"
-                             "                <DrawPoint ID=\"1\" Type=\"6\" X=\"15\" Y=\"30\"/>\n"
-                             "                <DrawPoint ID=\"2\" Type=\"2\" X=\"-15\" Y=\"45\"/>\n"
-                             "            </DrawPoints>\n"
-                             "        </DrawObject>\n"
-                             "    </DrawObjects>\n"
-                             "</ZephFixture>";
-    const std::string kesh = "            <Kesh Network=\"0\" Base_Unit=\"0\" Unit_Mode=\"0\" Channel_Mode=\"0\" "
-                             "Resolution=\"0\" Physical_Pixel_Number=\"1\"/>\n";
-    EXPECT_EQ(fixtureFileText(sampleFixture(kFixtureStrings), kChannelChoiceNo, "today"),
-              lines(head + "1" + sample + tail));
-    // A ribbon's place on the network is no channel data.
-    EXPECT_EQ(fixtureFileText(sampleFixture(kFixtureKesh), kChannelChoiceNo, "today"),
-              lines(head + "4" + sample + kesh + tail));
+// The elements are those of the editor file; here it is what stands round them, and what a choice leaves out.
+TEST(ObjectFiles, AreAFilesHeadAndItsObjects) {
+    const std::string head = "<?xml version='1.0' encoding='UTF-8'?>\r\n<ZephFixture zephSaveFileVersion=\"3.0.0\" "
+                             "CreatedAt=\"today\">\r\n    <DrawObjects>\r\n        <DrawObject ID=\"1\" Name=\"F &amp; "
+                             "G\" BulbSize=\"2\"";
+    const std::string tail = "        </DrawObject>\r\n    </DrawObjects>\r\n</ZephFixture>";
+    for (const std::int32_t type : {kFixtureStrings, kFixtureKesh}) {
+        const std::string text = fixtureFileText(sampleFixture(type), kChannelChoiceNo, "today");
+        EXPECT_TRUE(text.starts_with(head) && text.ends_with(tail)) << text;
+        EXPECT_EQ(text.find("<Novaline_Data"), std::string::npos);
+        EXPECT_EQ(text.find("<AssignedChannels"), std::string::npos);
+        // A ribbon's place on the network is no channel data.
+        EXPECT_EQ(text.find("<Kesh") != std::string::npos, type == kFixtureKesh);
+    }
 }
 
 TEST(ObjectFiles, AFixtureComesAlongAlone) {
@@ -104,9 +84,9 @@ TEST(ObjectFiles, AFixtureComesAlongAlone) {
             fixture.AssignedItem = 3;
             fixture.Kesh.Base_Unit = type == kFixtureKesh ? 5 : 0;
             fixture.DMX.Universe = type == kFixtureDmxPixels ? 9 : 0;
-            const std::string path = bench.folderPath + "a.zff";
+            const std::string path = bench.folder.path() + "a.zff";
             ASSERT_TRUE(ZephSaveFixtureXML(fixture, path, choice, bench.saving()));
-            buildTypicalDocument(*bench.simulation);
+            buildDisplay(*bench.simulation);
             const int count = bench.simulation->FixtureCount;
             ASSERT_TRUE(ZephLoadFixtureFileXML(path, bench.context, *bench.simulation, bench.channelsSeen));
             const bool channels = choice == kChannelChoiceYes && type == kFixtureStrings;
@@ -125,14 +105,14 @@ TEST(ObjectFiles, AFixtureComesAlongAlone) {
 
 TEST(ObjectFiles, APropTakesItsFixturesAlongInOrder) {
     ObjectBench bench;
-    buildTypicalDocument(*bench.simulation);
+    buildDisplay(*bench.simulation);
     ZephSimulation& document = *bench.simulation;
     const int prop = ++document.PropCount;
     document.Props[prop].Name = "Carried";
     document.Props[prop].QvMatrixInd = 2;
     for (const int fixture : {7, 9, 30})
         ZephAddFixtureToProp(fixture, prop, document);
-    const std::string path = bench.folderPath + "a.zpf";
+    const std::string path = bench.folder.path() + "a.zpf";
     ASSERT_TRUE(ZephSavePropXML(document, document.Props[prop], path, kChannelChoiceYes, bench.saving()));
     const int base = document.FixtureCount;
     ASSERT_TRUE(ZephLoadPropFileXML(path, bench.context, document, bench.channelsSeen));
@@ -182,27 +162,22 @@ TEST(ObjectFiles, SayWhatIsWrongWithAFile) {
         SCOPED_TRACE(row.text);
         ObjectBench bench;
         EXPECT_FALSE(row.prop ? bench.propText(row.text) : bench.fixtureText(row.text));
-        ASSERT_EQ(bench.host.boxes.size(), 1u);
-        EXPECT_EQ(bench.lastBox(), std::string("Qen Visualizer") + row.box);
+        EXPECT_EQ(bench.told(), row.box);
         EXPECT_EQ(bench.simulation->PropCount, 0);
         if (row.prop) continue;
         EXPECT_EQ(bench.simulation->FixtureCount, 0);
         EXPECT_TRUE(bench.simulation->Fixtures[1] == ZephFixture());
     }
     ObjectBench bench;
-    EXPECT_FALSE(
-        ZephLoadFixtureFileXML(bench.folderPath + "none", bench.context, *bench.simulation, bench.channelsSeen));
-    EXPECT_EQ(bench.lastBox(), "Qen VisualizerMissing Fixture File|Error:  The fixture file is missing or invalid.");
-    EXPECT_FALSE(ZephLoadPropFileXML(bench.folderPath, bench.context, *bench.simulation, bench.channelsSeen));
-    EXPECT_EQ(bench.lastBox(), "Qen VisualizerMissing Prop File|Error:  The Prop file is missing or invalid.");
-    EXPECT_FALSE(ZephSaveFixtureXML({}, bench.folderPath + "no/a.zff", kChannelChoiceNo, bench.saving()));
-    EXPECT_EQ(bench.lastBox(), "Qen Visualizer-Save Error|There was a problem saving the fixture data to disk.  Please "
-                               "try again.");
-    EXPECT_FALSE(
-        ZephSavePropXML(*bench.simulation, {}, bench.folderPath + "no/a.zpf", kChannelChoiceNo, bench.saving()));
-    EXPECT_EQ(bench.lastBox(),
-              "Qen Visualizer-Save Error|There was a problem saving the prop data to disk.  Please try "
-              "again.");
+    ZephSimulation& document = *bench.simulation;
+    EXPECT_FALSE(ZephLoadFixtureFileXML(bench.folder.path("none"), bench.context, document, bench.channelsSeen));
+    EXPECT_EQ(bench.told(), "Missing Fixture File|Error:  The fixture file is missing or invalid.");
+    EXPECT_FALSE(ZephLoadPropFileXML(bench.folder.path(), bench.context, document, bench.channelsSeen));
+    EXPECT_EQ(bench.told(), "Missing Prop File|Error:  The Prop file is missing or invalid.");
+    EXPECT_FALSE(ZephSaveFixtureXML({}, bench.folder.path("no/a.zff"), kChannelChoiceNo, bench.saving()));
+    EXPECT_EQ(bench.told(), "-Save Error|There was a problem saving the fixture data to disk.  Please try again.");
+    EXPECT_FALSE(ZephSavePropXML(document, {}, bench.folder.path("no/a.zpf"), kChannelChoiceNo, bench.saving()));
+    EXPECT_EQ(bench.told(), "-Save Error|There was a problem saving the prop data to disk.  Please try again.");
 }
 
 TEST(ObjectFiles, KeepWithinTheLimits) {
@@ -210,9 +185,9 @@ TEST(ObjectFiles, KeepWithinTheLimits) {
     ZephSimulation& document = *bench.simulation;
     document.FixtureCount = kMaxFixtures;
     EXPECT_FALSE(bench.fixtureText(file("ZephFixture", "3.0.0", objects(1))));
-    EXPECT_EQ(bench.host.boxes.at(0).title, "Qen Visualizer-Too many fixtures");
-    EXPECT_EQ(bench.host.boxes.at(0).text,
-              "You can not load this fixture since it would exceed the maximum number of fixtures allowed.");
+    EXPECT_EQ(bench.told(), "-Too many fixtures|You can not load this fixture since it would exceed the maximum number "
+                            "of fixtures allowed.\nQen Visualizer-Fixture Load|Error:  Could Not load the fixture's "
+                            "body.");
     EXPECT_EQ(document.FixtureCount, kMaxFixtures);
 
     // One too many by the prop's own list, then by the fixtures in the file.
@@ -220,10 +195,10 @@ TEST(ObjectFiles, KeepWithinTheLimits) {
     const std::string surplus = file("ZephProp", "2.1.0", items(2) + objects(3));
     for (const std::string& text : {listed, surplus}) {
         document.FixtureCount = kMaxFixtures - 2;
-        bench.host.boxes.clear();
         EXPECT_FALSE(bench.propText(text));
-        EXPECT_EQ(bench.host.boxes.at(0).text,
-                  "You can not load this prop since it would exceed the maximum number of fixtures allowed.");
+        EXPECT_EQ(bench.told(),
+                  "-Too many fixtures|You can not load this prop since it would exceed the maximum number "
+                  "of fixtures allowed.\nQen Visualizer-Prop Load|Error:  Could Not load the prop's body.");
         EXPECT_EQ(document.FixtureCount, kMaxFixtures - 2);
         EXPECT_EQ(document.PropCount, 0);
         EXPECT_TRUE(document.Fixtures[kMaxFixtures] == ZephFixture());
@@ -234,9 +209,8 @@ TEST(ObjectFiles, KeepWithinTheLimits) {
 
     document.FixtureCount = 0;
     document.PropCount = kMaxProps;
-    bench.host.boxes.clear();
     EXPECT_FALSE(bench.propText(listed));
-    EXPECT_EQ(bench.host.boxes.at(0).title, "Qen Visualizer-Too many props");
+    EXPECT_THAT(bench.told(), testing::StartsWith("-Too many props|"));
     EXPECT_EQ(document.FixtureCount, 0);
 }
 

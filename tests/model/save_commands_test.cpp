@@ -1,13 +1,6 @@
 #include "model/save_commands.h"
 #include "model/ui_state.h"
 #include "tests/support/loading.h"
-#include "util/whole_file.h"
-
-#include <QDir>
-#include <QFile>
-
-#include <gtest/gtest.h>
-
 namespace {
 
 constexpr const char* kOldFile = "<Zeph zephSaveFileVersion=\"2.1.0\"/>";
@@ -37,16 +30,18 @@ struct SaveBench : LoadBench, SaveFace, AutoSaveFace {
         for (int n = 0; n < ticks; ++n)
             tmrAutoSave_Timer({settings, *simulation, ZephUIState, stroke, host, failures, *this}, autosave);
     }
-    std::string text(const std::string& name) const {
-        QFile file(QString::fromStdString(folderPath + name));
-        return file.open(QIODevice::ReadOnly) ? file.readAll().toStdString() : "not there";
-    }
     void openOldFile() {
-        ASSERT_TRUE(replaceWholeFile(path(), kOldFile));
-        ASSERT_TRUE(ZephLoadVisualizerXML(true, context, *simulation));
+        folder.write("display.zee", kOldFile);
+        ASSERT_TRUE(load());
         ASSERT_TRUE(simulation->FileUpgraded);
         simulation->SimulationDirty = true;
     }
+    void openChanged(std::int32_t minutes) {
+        settings.AutoSave = minutes;
+        simulation->SimulationOpen = simulation->SimulationDirty = true;
+    }
+    void saveNow() { mnuFileSave_Click(saving, *simulation, autosave); }
+    void saveAs() { mnuFileSaveAs_Click(saving, *simulation, autosave); }
 };
 
 }  // namespace
@@ -54,41 +49,35 @@ struct SaveBench : LoadBench, SaveFace, AutoSaveFace {
 TEST(Saving, AnOlderFileIsBackedUpOnce) {
     SaveBench bench;
     bench.openOldFile();
-    for (int n = 1; n <= 6; ++n)
-        ASSERT_TRUE(replaceWholeFile(bench.path() + ".bak000" + std::to_string(n), "taken"));
+    for (char n = '1'; n <= '6'; ++n)
+        bench.folder.write(std::string("display.zee.bak000") + n, "taken");
     bench.autosave.Tag = 9;
-    mnuFileSave_Click(bench.saving, *bench.simulation, bench.autosave);
-    ASSERT_EQ(bench.host.boxes.size(), 1u);
-    EXPECT_EQ(bench.host.boxes[0].title, "File Backup");
-    EXPECT_EQ(bench.host.boxes[0].text,
-              "This Zeph file has been updated to the new G4 file format.  Your existing Zeph "
-              "file has been backed up and is named:\r\n\r\n" +
-                  bench.path() + ".bak0007");
-    EXPECT_EQ(bench.text("display.zee.bak0007"), kOldFile);
-    EXPECT_NE(bench.text("display.zee").find("\"3.0.0\""), std::string::npos);
+    bench.saveNow();
+    EXPECT_EQ(bench.host.boxTexts(), "File Backup|This Zeph file has been updated to the new G4 file format.  Your "
+                                     "existing Zeph file has been backed up and is named:\r\n\r\n" +
+                                         bench.path() + ".bak0007");
+    EXPECT_EQ(bench.folder.read("display.zee.bak0007"), kOldFile);
+    EXPECT_NE(bench.folder.read("display.zee").find("\"3.0.0\""), std::string::npos);
     EXPECT_EQ(bench.recent, std::vector<std::string>{bench.path()});
     EXPECT_EQ(bench.saved, 1);
     EXPECT_EQ(bench.autosave.Tag, 0);
     EXPECT_FALSE(bench.simulation->SimulationDirty || bench.simulation->FileUpgraded);
-    mnuFileSave_Click(bench.saving, *bench.simulation, bench.autosave);
-    EXPECT_EQ(bench.text("display.zee.bak0008"), "not there");
+    bench.saveNow();
+    EXPECT_EQ(bench.folder.read("display.zee.bak0008"), "not there");
 }
 
 TEST(Saving, AsksWhereNoBackUpCanBeMade) {
     for (const BoxAnswer answer : {BoxAnswer::No, BoxAnswer::Yes}) {
         SaveBench bench;
         bench.openOldFile();
-        for (int n = 1; n <= 1000; ++n) {
-            const QString digits = QString::number(n).rightJustified(4, '0');
-            QFile taken(QString::fromStdString(bench.path()) + ".bak" + digits);
-            ASSERT_TRUE(taken.open(QIODevice::WriteOnly));
-        }
+        for (int n = 1; n <= 1000; ++n)
+            bench.folder.write("display.zee.bak" + std::to_string(10000 + n).substr(1), "");
         bench.host.answers = {answer};
-        mnuFileSave_Click(bench.saving, *bench.simulation, bench.autosave);
-        EXPECT_EQ(bench.host.boxes.at(0).title, "Unable to create backup");
-        EXPECT_EQ(bench.host.boxes.at(0).text, "Unable to create backup G3 Zeph file.  Do you want to continue?");
+        bench.saveNow();
+        EXPECT_EQ(bench.host.boxTexts(),
+                  "Unable to create backup|Unable to create backup G3 Zeph file.  Do you want to continue?");
         EXPECT_EQ(bench.saved, answer == BoxAnswer::Yes ? 1 : 0);
-        EXPECT_EQ(bench.text("display.zee") == kOldFile, answer == BoxAnswer::No);
+        EXPECT_EQ(bench.folder.read("display.zee") == kOldFile, answer == BoxAnswer::No);
         EXPECT_EQ(bench.simulation->SimulationDirty, answer == BoxAnswer::No);
     }
 }
@@ -96,52 +85,48 @@ TEST(Saving, AsksWhereNoBackUpCanBeMade) {
 TEST(Saving, UnderANewNameLeavesTheOldFileAlone) {
     SaveBench bench;
     bench.openOldFile();
-    mnuFileSaveAs_Click(bench.saving, *bench.simulation, bench.autosave);  // cancelled
+    bench.saveAs();  // cancelled
     EXPECT_TRUE(bench.simulation->FileUpgraded && bench.simulation->SimulationDirty);
-    bench.chosen = bench.folderPath + "new.zee";
-    mnuFileSaveAs_Click(bench.saving, *bench.simulation, bench.autosave);
-    EXPECT_TRUE(bench.host.boxes.empty());
-    EXPECT_EQ(bench.text("display.zee"), kOldFile);
+    bench.chosen = bench.folder.path("new.zee");
+    bench.saveAs();
+    EXPECT_EQ(bench.host.boxTexts(), "");
+    EXPECT_EQ(bench.folder.read("display.zee"), kOldFile);
     EXPECT_EQ(bench.path(), bench.chosen);
     EXPECT_FALSE(bench.simulation->FileUpgraded);
-    EXPECT_NE(bench.text("new.zee"), "not there");
+    EXPECT_NE(bench.folder.read("new.zee"), "not there");
 
-    bench.simulation->FileName.clear();
-    bench.simulation->FileUpgraded = true;
-    bench.chosen = bench.folderPath + "named.zee";
-    mnuFileSave_Click(bench.saving, *bench.simulation, bench.autosave);
-    EXPECT_NE(bench.text("named.zee"), "not there");
-    bench.simulation->FileName.clear();
-    bench.simulation->FileUpgraded = true;
-    bench.chosen.clear();
-    mnuFileSave_Click(bench.saving, *bench.simulation, bench.autosave);
-    EXPECT_FALSE(bench.simulation->FileUpgraded) << "even when the dialog is cancelled";
+    for (const char* name : {"named.zee", ""}) {
+        bench.simulation->FileName.clear();
+        bench.simulation->FileUpgraded = true;
+        bench.chosen = *name ? bench.folder.path(name) : "";
+        bench.saveNow();
+        EXPECT_FALSE(bench.simulation->FileUpgraded) << "even when the dialog is cancelled";
+    }
+    EXPECT_NE(bench.folder.read("named.zee"), "not there");
     EXPECT_EQ(bench.saved, 2);
 }
 
 TEST(Saving, AProtectedFileIsToldAndTheDocumentCountsAsSaved) {
     SaveBench bench;
-    ASSERT_TRUE(replaceWholeFile(bench.path(), "protected"));
-    ASSERT_TRUE(QFile::setPermissions(QString::fromStdString(bench.path()), QFile::ReadOwner));
+    bench.folder.write("display.zee", "protected");
+    bench.folder.protect("display.zee");
     bench.simulation->SimulationDirty = true;
-    mnuFileSave_Click(bench.saving, *bench.simulation, bench.autosave);
+    bench.saveNow();
     ASSERT_EQ(bench.host.boxes.size(), 1u);
     EXPECT_EQ(bench.host.boxes[0].title, "Qen Visualizer-Save Error");
     EXPECT_FALSE(bench.simulation->SimulationDirty);
-    EXPECT_EQ(bench.text("display.zee"), "protected");
-    EXPECT_EQ(QDir(bench.folder.path()).entryList(QDir::Files).size(), 1) << "nothing is left beside it";
+    EXPECT_EQ(bench.folder.read("display.zee"), "protected");
+    EXPECT_EQ(bench.folder.files(), 1) << "nothing is left beside it";
 }
 
 TEST(AutoSave, SavesAfterThirtySixSecondsAMinute) {
     SaveBench bench;
-    bench.settings.AutoSave = 2;
-    bench.simulation->SimulationOpen = bench.simulation->SimulationDirty = true;
+    bench.openChanged(2);
     bench.host.panels[2] = "kept";
     bench.tick(119);
     EXPECT_EQ(bench.saved, 0);
     bench.tick(1);
     EXPECT_EQ(bench.saved, 1);
-    EXPECT_EQ(bench.host.panels[2], "kept");
     EXPECT_EQ(bench.host.panel2History, (std::vector<std::string>{"Autosave in progress.", "kept"}));
     bench.tick(240);
     EXPECT_EQ(bench.saved, 1) << "nothing has changed since";
@@ -150,15 +135,12 @@ TEST(AutoSave, SavesAfterThirtySixSecondsAMinute) {
 
 TEST(AutoSave, WaitsForAStateThatAllowsIt) {
     SaveBench bench;
-    bench.settings.AutoSave = 1;
-    bench.simulation->SimulationOpen = bench.simulation->SimulationDirty = true;
-    for (const int state : {kStateSimulation, kStateSelectProp}) {
+    bench.openChanged(1);
+    for (const int state : {kStateSimulation, kStateSelectProp, kStateDrawing}) {
         bench.ZephUIState = state;
+        bench.stroke = state == kStateDrawing;
         bench.tick(100);
     }
-    bench.ZephUIState = kStateDrawing;
-    bench.stroke = true;
-    bench.tick(100);
     EXPECT_EQ(bench.saved, 0);
     bench.stroke = false;
     bench.tick(1);
@@ -167,9 +149,8 @@ TEST(AutoSave, WaitsForAStateThatAllowsIt) {
 
 TEST(AutoSave, WarnsAgainAndAgainWhereThereIsNoName) {
     SaveBench bench;
-    bench.settings.AutoSave = 1;
+    bench.openChanged(1);
     bench.simulation->FileName.clear();
-    bench.simulation->SimulationOpen = bench.simulation->SimulationDirty = true;
     bench.tick(179);
     EXPECT_EQ(bench.host.panel2History,
               std::vector<std::string>(2, "Warning:  Autosave is disabled until you save this new file"));

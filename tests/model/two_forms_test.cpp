@@ -1,29 +1,29 @@
 // The quick form of reading must give exactly what the general form gives, whatever is done to a file.
+#include "display.h"
 #include "model/editor_writer.h"
 #include "model/source_text.h"
 #include "model/xml_scanner.h"
-#include "tests/support/limit_document.h"
 #include "tests/support/loading.h"
 #include "util/random_source.h"
 
-#include <gtest/gtest.h>
-
-#include <array>
+#include <iterator>
+#include <sstream>
 
 namespace {
 
 // A display small enough that a change is likely to hit something, with one of everything.
 std::string smallDisplay(LoadBench& bench) {
     const auto full = std::make_unique<ZephSimulation>();
-    buildTypicalDocument(*full);
+    buildDisplay(*full);
     ZephSimulation& simulation = *bench.simulation;
-    simulation.Background = {2, bench.folderPath + "a&b.png", 100, 15000, 15000};
+    simulation.Background = {2, bench.folder.path("a&b.png"), 100, 15000, 15000};
     simulation.PropCount = 1;
-    simulation.Props[1] = full->Props[6];
-    for (const int f : {1, 2, 33, 41, 43}) {
-        simulation.Fixtures[++simulation.FixtureCount] = full->Fixtures[f];
-        ZephFixture& fixture = simulation.Fixtures[simulation.FixtureCount];
-        fixture.AssignedItem = simulation.FixtureCount == 1 ? 1 : 0;
+    simulation.Props[1] = full->Props[1];
+    simulation.Props[1].Name = "Pixels & \"stars\" <garden>";
+    for (std::int32_t type = kFixtureStrings; type <= kFixtureDmxPixels; ++type) {
+        ZephFixture& fixture = simulation.Fixtures[++simulation.FixtureCount];
+        fixture = *std::ranges::find(full->Fixtures, type, &ZephFixture::Fixture_Type);
+        fixture.AssignedItem = type == kFixtureStrings ? 1 : 0;
         fixture.PointCount = std::min(fixture.PointCount, 3);
         fixture.ChannelCount = std::min(fixture.ChannelCount, 2);
     }
@@ -34,72 +34,31 @@ std::string smallDisplay(LoadBench& bench) {
 
 // One of the things that happen to files, or that people do to them.
 void harm(std::string& text, RandomSource& random) {
-    static constexpr std::array<std::string_view, 34> kPieces{"<",
-                                                              ">",
-                                                              "/",
-                                                              "\"",
-                                                              "'",
-                                                              " ",
-                                                              "\t",
-                                                              "\r\n",
-                                                              "&amp;",
-                                                              "&",
-                                                              "&#65;",
-                                                              "&bad;",
-                                                              "<!-- x -->",
-                                                              "<![CDATA[]]>",
-                                                              "<?x y?>",
-                                                              "<A/>",
-                                                              "</A>",
-                                                              "<Level ID=\"3\"/>",
-                                                              "-1",
-                                                              "0",
-                                                              "257",
-                                                              "2147483648",
-                                                              "+",
-                                                              "True",
-                                                              "x",
-                                                              "ID=\"2\"",
-                                                              " ID=\"1\"",
-                                                              " LED=\"True\"",
-                                                              "\xC3\xA4",
-                                                              "\xFF",
-                                                              "2.1.0",
-                                                              "=",
-                                                              "</DrawPoints>",
-                                                              "Kesh"};
+    static const std::vector<std::string> kPieces = [] {
+        std::vector<std::string> pieces{
+            " ", "\t", "\r\n", "<!-- x -->", "<?x y?>", "<Level ID=\"3\"/>", " ID=\"1\"", " LED=\"True\""};
+        std::istringstream rest("< > / \" ' &amp; & &#65; &bad; <![CDATA[]]> <A/> </A> -1 0 257 2147483648 + True x "
+                                "ID=\"2\" \xC3\xA4 \xFF 2.1.0 = </DrawPoints> Kesh");
+        pieces.insert(pieces.end(), std::istream_iterator<std::string>(rest), {});
+        return pieces;
+    }();
     const auto size = static_cast<std::int32_t>(text.size());
     const auto at = static_cast<std::size_t>(ZephReturnRandomNumber(0, size - 1, random));
     const auto length = static_cast<std::size_t>(ZephReturnRandomNumber(1, 12, random));
-    const std::string_view piece = kPieces[static_cast<std::size_t>(
+    const std::string& piece = kPieces[static_cast<std::size_t>(
         ZephReturnRandomNumber(0, static_cast<std::int32_t>(kPieces.size()) - 1, random))];
-    switch (ZephReturnRandomNumber(0, 6, random)) {
-    case 0:
-        text.erase(at, length);
-        break;
-    case 1:
-        text.replace(at, piece.size(), piece);
-        break;
-    case 2:
-        text.insert(at, text.substr(at, 5 * length));
-        break;
-    case 3:
-        text.at(at) = static_cast<char>(ZephReturnRandomNumber(0, 255, random));
-        break;
-    case 4: {  // a value rather than any place: between two quotes
-        const std::size_t quote = text.find("=\"", at);
-        if (quote != std::string::npos) text.replace(quote + 2, text.find('"', quote + 2) - quote - 2, piece);
-        break;
-    }
-    case 5: {  // a whole attribute
-        const std::size_t blank = text.find(' ', at);
-        if (blank != std::string::npos) text.erase(blank, text.find(' ', blank + 1) - blank);
-        break;
-    }
-    default:
-        text.insert(at, piece);
-        break;
-    }
+    const std::size_t quote = text.find("=\"", at);
+    const std::size_t blank = text.find(' ', at);
+    const std::int32_t kind = ZephReturnRandomNumber(0, 6, random);
+    if (kind == 0) text.erase(at, length);
+    if (kind == 1) text.replace(at, piece.size(), piece);
+    if (kind == 2) text.insert(at, text.substr(at, 5 * length));
+    if (kind == 3) text.at(at) = static_cast<char>(ZephReturnRandomNumber(0, 255, random));
+    // A value rather than any place: between two quotes.
+    if (kind == 4 && quote != std::string::npos) text.replace(quote + 2, text.find('"', quote + 2) - quote - 2, piece);
+    // A whole attribute.
+    if (kind == 5 && blank != std::string::npos) text.erase(blank, text.find(' ', blank + 1) - blank);
+    if (kind == 6) text.insert(at, piece);
 }
 
 struct Outcome {
@@ -109,24 +68,15 @@ struct Outcome {
     Outcome(const std::string& text, TextReading reading) {
         bench.simulation->FilePath = "";
         bench.paths = ZephPathService("/base");  // the same for both, since it shows in the picture's path
-        result = loadEditorText(text, reading, true, bench.context, *bench.simulation);
+        result = bench.read(text, reading);
     }
 };
 
 void expectSame(const Outcome& quick, const Outcome& general) {
     EXPECT_EQ(quick.result, general.result);
     EXPECT_TRUE(*quick.bench.simulation == *general.bench.simulation);
-    ASSERT_EQ(quick.bench.host.boxes.size(), general.bench.host.boxes.size());
-    for (std::size_t box = 0; box < quick.bench.host.boxes.size(); ++box)
-        EXPECT_EQ(quick.bench.host.boxes[box].text, general.bench.host.boxes[box].text);
-    const auto& left = quick.bench.failures.reports;
-    const auto& right = general.bench.failures.reports;
-    ASSERT_EQ(left.size(), right.size());
-    for (std::size_t report = 0; report < left.size(); ++report) {
-        EXPECT_EQ(left[report].description, right[report].description);
-        EXPECT_EQ(left[report].procedure, right[report].procedure);
-        EXPECT_EQ(left[report].line, right[report].line);
-    }
+    EXPECT_EQ(quick.bench.host.boxTexts(), general.bench.host.boxTexts());
+    EXPECT_EQ(quick.bench.failures.reports, general.bench.failures.reports);
     EXPECT_EQ(quick.bench.watcher.selections, general.bench.watcher.selections);
 }
 
@@ -166,12 +116,11 @@ TEST(TwoForms, AgreeWhereverTheFileEnds) {
 TEST(TwoForms, TheQuickFormTakesWhatTheProgramWrites) {
     LoadBench bench;
     const std::string text = smallDisplay(bench);
-    EXPECT_TRUE(loadEditorText(text, TextReading::QuickOnly, true, bench.context, *bench.simulation));
+    EXPECT_TRUE(bench.read(text, TextReading::QuickOnly));
     for (const char* unusual :
          {"<Zeph zephSaveFileVersion='3.0.0'></Zeph>", "<Zeph zephSaveFileVersion=\"3.0.0\"/><!---->",
           "<Zeph zephSaveFileVersion=\"3.0.0\" A=\"\" A=\"\"/>", "<Zeph a=\"<\"/>", "<Zeph", ""}) {
-        EXPECT_FALSE(loadEditorText(unusual, TextReading::QuickOnly, true, bench.context, *bench.simulation))
-            << unusual;
+        EXPECT_FALSE(bench.read(unusual, TextReading::QuickOnly)) << unusual;
         EXPECT_EQ(bench.simulation->FixtureCount, 5) << unusual;
     }
 }

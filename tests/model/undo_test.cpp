@@ -1,11 +1,10 @@
+#include "display.h"
 #include "model/editor_writer.h"
 #include "model/ui_state.h"
 #include "model/undo.h"
 #include "tests/support/limit_document.h"
 #include "tests/support/loading.h"
 #include "util/random_source.h"
-
-#include <gtest/gtest.h>
 
 namespace {
 
@@ -42,6 +41,15 @@ struct UndoBench : LoadBench, UndoFace {
     std::string undoText() const { return stores.UndoStore.back().Text; }
 };
 
+// Every third fixture of the example: all kinds, and a text that is soon written.
+void openDisplay(UndoBench& bench) {
+    ZephGlobalReset(true, *bench.simulation, bench.watcher);
+    buildDisplay(*bench.simulation);
+    for (int f = bench.simulation->FixtureCount; f >= 1; --f) {
+        if (f % 3 != 0) ZephDeleteThisFixture(f, true, *bench.simulation, bench.watcher);
+    }
+}
+
 // What is written of a document that has read the text: a reader knows the device 99 by another number.
 std::string asRead(std::string text) {
     constexpr std::string_view kWritten = "DeviceType=\"99\"";
@@ -57,67 +65,33 @@ void change(RandomSource& random, UndoBench& bench) {
     const int f = pick(1, std::max(document.FixtureCount, 1));
     const int p = pick(1, std::max(document.PropCount, 1));
     ZephFixture& fixture = document.Fixtures[f];
-    switch (pick(0, 15)) {
-    case 0:
-        if (document.FixtureCount > 0) ZephDeleteThisFixture(f, true, document, bench.watcher);
-        break;
-    case 1:
-        if (document.PropCount > 0) ZephDeleteThisProp(p, document);
-        break;
-    case 2:
-        if (document.FixtureCount > 0 && document.PropCount > 0) ZephAddFixtureToProp(f, p, document);
-        break;
-    case 3:
-        if (document.FixtureCount > 0) ZephDisassociateFromProp(f, fixture.AssignedItem, document);
-        break;
-    case 4:
-        if (document.FixtureCount < 80) document.Fixtures[++document.FixtureCount] = fixture;
-        break;
-    case 5:
-        if (document.PropCount < 20) document.Props[++document.PropCount].Name = "P" + std::to_string(pick(0, 999));
-        break;
-    case 6:
-        fixture.Name = "\x01"
-                       "a\r\n\t<&>\"\xC3\xA4\x1F\xEF\xBF\xBE\xEF\xBC\x81" +
-                       std::to_string(pick(0, 999));
-        break;
-    case 7:
-        fixture.PointCount = pick(-1, 300);
-        fixture.DrawPoints[pick(1, kMaxPoints)] = {kPointBulb, -1, pick(-100000, 100000)};
-        break;
-    case 8:
-        fixture.ChannelCount = pick(-1, 20);
-        fixture.Channels[pick(1, kMaxChannels)].DeviceType = pick(-1, 2) < 0 ? kDeviceClearedInFile : pick(-5, 7);
-        break;
-    case 9:
-        fixture.Fixture_Type = pick(0, 6);
-        fixture.Kesh.Base_Unit = pick(0, 9);
-        fixture.DMX.Universe = pick(0, 9);
-        break;
-    case 10:
-        fixture.AssignedItem = pick(-2, kMaxProps + 2);
-        fixture.AssignedItemName = "stale";
-        break;
-    case 11:
-        document.Props[p].AssignedCount = pick(-1, 70);
-        document.Props[p].Object[pick(1, kMaxFixturesInProp)] = pick(-1, 2000);
-        break;
-    case 12:
-        document.Background.BackgroundType = pick(0, 2);
-        document.Background.PicFileName = (pick(0, 1) ? bench.folderPath : std::string("/")) + "house\x02.png";
-        break;
-    case 13:
-        document.Levels[pick(1, kLevels)] = {pick(0, 1) == 0, pick(0, 1) == 0, "L" + std::to_string(pick(0, 99))};
-        document.Dimmed = pick(-1, 101);
-        break;
-    case 14:  // beyond the counts, where no writer looks
-        document.Fixtures[kMaxFixtures].Name = "left behind";
-        document.Props[kMaxProps].AssignedCount = 3;
-        break;
-    default:
-        std::swap(fixture, document.Fixtures[pick(1, std::max(document.FixtureCount, 1))]);
-        break;
-    }
+    const auto number = [&] { return std::to_string(pick(0, 999)); };
+    const bool some = document.FixtureCount > 0;
+    const int kind = pick(0, 22);
+    if (kind == 0 && some) ZephDeleteThisFixture(f, true, document, bench.watcher);
+    if (kind == 1 && document.PropCount > 0) ZephDeleteThisProp(p, document);
+    if (kind == 2 && some && document.PropCount > 0) ZephAddFixtureToProp(f, p, document);
+    if (kind == 3 && some) ZephDisassociateFromProp(f, fixture.AssignedItem, document);
+    if (kind == 4 && document.FixtureCount < 80) document.Fixtures[++document.FixtureCount] = fixture;
+    if (kind == 5 && document.PropCount < 20) document.Props[++document.PropCount].Name = "P" + number();
+    if (kind == 6) fixture.Name = "\x01 a\r\n\t<&>\"\xC3\xA4\x1F\xEF\xBF\xBE\xEF\xBC\x81" + number();
+    if (kind == 7) fixture.PointCount = pick(-1, 300);
+    if (kind == 8) fixture.DrawPoints[pick(1, kMaxPoints)] = {kPointBulb, -1, pick(-100000, 100000)};
+    if (kind == 9) fixture.ChannelCount = pick(-1, 20);
+    if (kind == 10)
+        fixture.Channels[pick(1, kMaxChannels)].DeviceType = pick(0, 2) ? pick(-5, 7) : kDeviceClearedInFile;
+    if (kind == 11) fixture.Fixture_Type = pick(0, 6);
+    if (kind == 12) fixture.Kesh.Base_Unit = fixture.DMX.Universe = pick(0, 9);
+    if (kind == 13) fixture.AssignedItem = pick(-2, kMaxProps + 2);
+    if (kind == 14) fixture.AssignedItemName = "stale";
+    if (kind == 15) document.Props[p].AssignedCount = pick(-1, 70);
+    if (kind == 16) document.Props[p].Object[pick(1, kMaxFixturesInProp)] = pick(-1, 2000);
+    if (kind == 17) document.Background = {pick(0, 2), (pick(0, 1) ? bench.folder.path() : "/") + "a\x02.png"};
+    if (kind == 18) document.Levels[pick(1, kLevels)] = {pick(0, 1) == 0, pick(0, 1) == 0, "L" + number()};
+    if (kind == 19) document.Dimmed = pick(-1, 101);
+    if (kind == 20) document.Fixtures[kMaxFixtures].Name = "left behind";  // beyond the counts, where no writer looks
+    if (kind == 21) document.Props[kMaxProps].AssignedCount = 3;
+    if (kind == 22) std::swap(fixture, document.Fixtures[pick(1, std::max(document.FixtureCount, 1))]);
 }
 
 }  // namespace
@@ -127,7 +101,7 @@ TEST(Undo, GivesExactlyWhatWritingAndReadingWouldGive) {
     LoadBench reader;
     reader.paths = bench.paths;
     SeededRandom random(7);
-    buildTypicalDocument(*bench.simulation);
+    openDisplay(bench);
     int undone = 0;
     for (int round = 0; round < 90 && !HasFailure(); ++round) {
         std::vector<std::string> texts;  // the document before each step
@@ -146,7 +120,7 @@ TEST(Undo, GivesExactlyWhatWritingAndReadingWouldGive) {
             bench.takeBack();
             ASSERT_EQ(bench.text(), texts[texts.size() - 1 - static_cast<std::size_t>(step)]);
         }
-        ASSERT_TRUE(loadEditorText(bench.text(), TextReading::GeneralOnly, true, reader.context, *reader.simulation));
+        ASSERT_TRUE(reader.read(bench.text(), TextReading::GeneralOnly));
         for (auto flag : {&ZephSimulation::SimulationDirty, &ZephSimulation::SimulationOpen})
             (*reader.simulation).*flag = (*bench.simulation).*flag;
         reader.simulation->FilePath = bench.simulation->FilePath;
@@ -156,8 +130,7 @@ TEST(Undo, GivesExactlyWhatWritingAndReadingWouldGive) {
             bench.again();
         ASSERT_EQ(bench.text(), last);
         if (bench.simulation->FixtureCount >= 10) continue;
-        ZephGlobalReset(true, *bench.simulation, bench.watcher);
-        buildTypicalDocument(*bench.simulation);
+        openDisplay(bench);
     }
     EXPECT_GT(undone, 700);
     EXPECT_TRUE(bench.failures.reports.empty());
@@ -306,6 +279,7 @@ TEST(Undo, RedoOutlivesALoadAndNamesNothing) {
     EXPECT_EQ(ZephUndoCaptions(bench.stores).redoItem, "Redo Deleted ");
     ZephGlobalReset(false, *bench.simulation, bench.watcher);
     bench.stores.UndoPosition = 0;  // as the window's watcher does
+    bench.simulation->Fixtures[1].Name = "another";
     bench.again();
     EXPECT_EQ(bench.name(1), "old");
     EXPECT_EQ(bench.stores.UndoPosition, 1);

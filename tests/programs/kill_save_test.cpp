@@ -8,8 +8,6 @@
 #include <QProcess>
 #include <QThread>
 
-#include <gtest/gtest.h>
-
 namespace {
 
 constexpr int kKills = 30;
@@ -30,7 +28,7 @@ TEST(KilledWhileSaving, TheFileIsWholeEachTime) {
     writeDisplay(bench, "a.zee", kFixtures[0]);
     writeDisplay(bench, "b.zee", kFixtures[1]);
     writeDisplay(bench, "out.zee", kFixtures[0]);
-    const QString folder = QString::fromStdString(bench.folderPath);
+    const QString folder = bench.folder.qPath();
     SeededRandom random(3);
     qint64 whole = 0;  // what an undisturbed run takes, ms
     int killed = 0;
@@ -54,7 +52,7 @@ TEST(KilledWhileSaving, TheFileIsWholeEachTime) {
         if (process.exitStatus() == QProcess::CrashExit) ++killed;
 
         bench.name("out.zee");
-        ASSERT_TRUE(ZephLoadVisualizerXML(true, bench.context, *bench.simulation)) << "run " << run;
+        ASSERT_TRUE(bench.load()) << "run " << run;
         EXPECT_FALSE(bench.simulation->ChecksumMismatch) << "run " << run;
         const std::int32_t fixtures = bench.simulation->FixtureCount;
         EXPECT_TRUE(fixtures == kFixtures[0] || fixtures == kFixtures[1]) << fixtures;

@@ -3,24 +3,22 @@
 #include "link/sequencer_message.h"
 #include "programs/tool/record_command.h"
 #include "programs/tool/send_command.h"
+#include "tests/support/folder.h"
 #include "util/settings_store.h"
 
 #include <QCoreApplication>
 #include <QElapsedTimer>
 #include <QTcpServer>
-#include <QTemporaryDir>
 #include <QUdpSocket>
-
-#include <gtest/gtest.h>
 
 #include <atomic>
 #include <csignal>
-#include <fstream>
 #include <pthread.h>
-#include <sstream>
 #include <thread>
 
 namespace {
+
+using namespace std::chrono_literals;
 
 // A port that was free a moment ago.
 std::int32_t freePort(bool tcp) {
@@ -34,66 +32,97 @@ std::int32_t freePort(bool tcp) {
     return socket.localPort();
 }
 
-struct SendRecord : testing::TestWithParam<bool> {
-    std::string path(const char* name) const { return folder.filePath(name).toStdString(); }
+// A command of the tool on a thread of its own, stopped as a user would stop it.
+class Running {
+public:
+    explicit Running(std::function<int()> command) : thread_([this, command] { status_ = command(); }) {}
+    ~Running() {
+        if (thread_.joinable()) stop(SIGTERM);
+    }
+    Running(const Running&) = delete;
+    Running& operator=(const Running&) = delete;
+    bool ended() const { return status_ >= 0; }
+    int stop(int signal) {
+        pthread_kill(thread_.native_handle(), signal);
+        thread_.join();
+        return status_;
+    }
 
-    // A capture of 20 pieces, 10 ms apart.
-    void writeCapture() {
-        CaptureWriter writer(path("sent.zcap"));
-        for (std::int32_t i = 0; i < 20; ++i)
-            writer.piece(i * 10, "\x01" + std::to_string(100 + i) + "\\\xFF\x04");
+private:
+    std::atomic<int> status_ = -1;
+    std::thread thread_;
+};
+
+// Waits until the condition holds; false after five seconds.
+bool eventually(const std::function<bool()>& condition) {
+    QElapsedTimer clock;
+    clock.start();
+    while (!condition() && clock.elapsed() < 5000)
+        std::this_thread::sleep_for(2ms);
+    return condition();
+}
+
+struct Sending : testing::Test {
+    // So many pieces, some ms apart.
+    void writeCapture(const char* name, std::int32_t pieces, std::int32_t stepMs) {
+        CaptureWriter writer(folder.path(name));
+        for (std::int32_t i = 0; i < pieces; ++i)
+            writer.piece(i * stepMs, "\x01" + std::to_string(100 + i) + "\\\xFF\x04");
     }
-    ToolOptions options() const {
-        ToolOptions made;
-        made.file = path("sent.zcap");
-        made.out = path("heard.zcap");
-        made.port = port;
-        made.tcp = GetParam();
-        return made;
+    // What a call wrote to standard error.
+    static std::string messageOf(const std::function<void()>& call) {
+        testing::internal::CaptureStderr();
+        call();
+        return testing::internal::GetCapturedStderr();
     }
-    // Starts a recording and waits until its file stands, which it does once the port is open.
-    void startRecording(const ToolOptions& made) {
-        recorder = std::thread([this, made] { recorded = runRecord(made); });
-        while (!std::ifstream(made.out).is_open() && recorded < 0)
-            std::this_thread::sleep_for(std::chrono::milliseconds(2));
-    }
-    // Stops it as a user would, once the file has the bytes or five seconds are over.
-    void stopRecordingAfter(std::size_t bytes) {
-        QElapsedTimer clock;
-        clock.start();
-        while (bytesOf("heard.zcap").size() < bytes && clock.elapsed() < 5000)
-            std::this_thread::sleep_for(std::chrono::milliseconds(5));
-        pthread_kill(recorder.native_handle(), SIGTERM);
-        recorder.join();
-    }
-    std::string bytesOf(const char* name) const {
-        std::string bytes;
-        for (const CapturePiece& piece : loadCapture(path(name)).pieces)
-            bytes += piece.bytes;
-        return bytes;
+    // Datagrams that arrive, up to ten, until none comes for so long.
+    static int heard(QUdpSocket& ear, int patienceMs) {
+        int datagrams = 0;
+        while (datagrams < 10 && ear.waitForReadyRead(patienceMs)) {
+            for (; ear.hasPendingDatagrams(); ++datagrams)
+                ear.readDatagram(nullptr, 0);
+        }
+        return datagrams;
     }
 
     int count = 0;
     QCoreApplication application{count, nullptr};
-    QTemporaryDir folder;
+    Folder folder;
+};
+
+struct SendRecord : Sending, testing::WithParamInterface<bool> {
+    ToolOptions options() const {
+        ToolOptions made;
+        made.file = folder.path("sent.zcap");
+        made.out = folder.path("heard.zcap");
+        made.port = port;
+        made.tcp = GetParam();
+        return made;
+    }
+    std::string bytesOf(const char* name) const {
+        std::string bytes;
+        for (const CapturePiece& piece : loadCapture(folder.path(name)).pieces)
+            bytes += piece.bytes;
+        return bytes;
+    }
     std::int32_t port = freePort(GetParam());
-    std::thread recorder;
-    std::atomic<int> recorded = -1;
 };
 
 }  // namespace
 
 TEST_P(SendRecord, WhatIsSentIsRecordedInItsTimeUntilTheUserStops) {
-    writeCapture();
-    startRecording(options());
+    writeCapture("sent.zcap", 20, 10);
+    Running recorder([made = options()] { return runRecord(made); });
+    // Its file stands once the port is open.
+    ASSERT_TRUE(eventually([&] { return QFile::exists(folder.qPath("heard.zcap")) || recorder.ended(); }));
     QElapsedTimer clock;
     clock.start();
     EXPECT_EQ(runSend(options()), 0);
     EXPECT_GE(clock.elapsed(), 190);
-    stopRecordingAfter(bytesOf("sent.zcap").size());
-    EXPECT_EQ(recorded, 0);
+    eventually([&] { return bytesOf("heard.zcap").size() >= bytesOf("sent.zcap").size(); });
+    EXPECT_EQ(recorder.stop(SIGTERM), 0);
     EXPECT_EQ(bytesOf("heard.zcap"), bytesOf("sent.zcap"));
-    const Capture heard = loadCapture(path("heard.zcap"));
+    const Capture heard = loadCapture(folder.path("heard.zcap"));
     EXPECT_GE(heard.pieces.back().timeMs - heard.pieces.front().timeMs, 150);
     if (!GetParam()) {
         EXPECT_EQ(heard.pieces.size(), 20u);  // a datagram stays a piece
@@ -101,128 +130,72 @@ TEST_P(SendRecord, WhatIsSentIsRecordedInItsTimeUntilTheUserStops) {
 }
 
 TEST_P(SendRecord, ATakenPortFailsAndLeavesTheFileAlone) {
-    std::ofstream(path("heard.zcap")) << "kept";
+    folder.write("heard.zcap", "kept");
     QUdpSocket udp;
     QTcpServer tcp;
-    ToolOptions taken = options();
-    if (GetParam()) {
-        ASSERT_TRUE(tcp.listen(QHostAddress::AnyIPv4));
-        taken.port = tcp.serverPort();
-    } else {
-        ASSERT_TRUE(udp.bind(QHostAddress::LocalHost, 0, QAbstractSocket::DontShareAddress));
-        taken.port = udp.localPort();
-    }
-    testing::internal::CaptureStderr();
-    EXPECT_EQ(runRecord(taken), 1);
-    EXPECT_NE(testing::internal::GetCapturedStderr().find("already in use by another program"), std::string::npos);
-    std::stringstream content;
-    content << std::ifstream(path("heard.zcap")).rdbuf();
-    EXPECT_EQ(content.str(), "kept");
+    ASSERT_TRUE(tcp.listen(QHostAddress::AnyIPv4));
+    ASSERT_TRUE(udp.bind(QHostAddress::LocalHost, 0, QAbstractSocket::DontShareAddress));
+    port = GetParam() ? tcp.serverPort() : udp.localPort();
+    EXPECT_THAT(messageOf([&] { EXPECT_EQ(runRecord(options()), 1); }),
+                testing::HasSubstr("already in use by another program"));
+    EXPECT_EQ(folder.read("heard.zcap"), "kept");
 }
 
 INSTANTIATE_TEST_SUITE_P(Protocols, SendRecord, testing::Values(false, true),
                          [](const auto& protocol) { return std::string(protocol.param ? "Tcp" : "Udp"); });
 
-TEST(Send, LoopsAtItsSpeedUntilTheUserStops) {
-    int count = 0;
-    const QCoreApplication application(count, nullptr);
-    const QTemporaryDir folder;
+TEST_F(Sending, LoopsAtItsSpeedUntilTheUserStops) {
+    writeCapture("loop.zcap", 2, 10'000);
+    QUdpSocket ear;
+    ASSERT_TRUE(ear.bind(QHostAddress::LocalHost, 0));
     ToolOptions options;
-    options.file = folder.filePath("loop.zcap").toStdString();
-    {
-        CaptureWriter writer(options.file);
-        writer.piece(0, "a");
-        writer.piece(10'000, "b");
-    }
-    QUdpSocket receiver;
-    ASSERT_TRUE(receiver.bind(QHostAddress::LocalHost, 0));
-    options.port = receiver.localPort();
+    options.file = folder.path("loop.zcap");
+    options.port = ear.localPort();
     options.loop = true;
     options.speed = 1000;
-    std::atomic<int> status = -1;
-    std::thread sender([&] { status = runSend(options); });
-    int datagrams = 0;
-    while (datagrams < 6 && receiver.waitForReadyRead(5000)) {
-        char byte = 0;
-        while (receiver.hasPendingDatagrams()) {
-            EXPECT_EQ(receiver.readDatagram(&byte, 1), 1);
-            ++datagrams;
-        }
-    }
-    EXPECT_GE(datagrams, 6);
-    pthread_kill(sender.native_handle(), SIGINT);
-    sender.join();
-    EXPECT_EQ(status, 0);
+    Running sender([options] { return runSend(options); });
+    EXPECT_GE(heard(ear, 5000), 10);
+    EXPECT_EQ(sender.stop(SIGINT), 0);
 }
 
-TEST(Send, AnUnusableCaptureOrReceiverIsAMessage) {
-    int count = 0;
-    const QCoreApplication application(count, nullptr);
-    const QTemporaryDir folder;
+TEST_F(Sending, AnUnusableCaptureOrReceiverIsAMessage) {
     ToolOptions options;
-    options.file = folder.filePath("missing.zcap").toStdString();
-    testing::internal::CaptureStderr();
-    EXPECT_EQ(runSend(options), 1);
-    EXPECT_NE(testing::internal::GetCapturedStderr().find("missing.zcap cannot be read"), std::string::npos);
+    options.file = folder.path("missing.zcap");
+    const auto message = [&] { return messageOf([&] { EXPECT_EQ(runSend(options), 1); }); };
+    EXPECT_THAT(message(), testing::HasSubstr("missing.zcap cannot be read"));
     CaptureWriter(options.file).piece(0, std::string(70'000, 'x'));
     options.port = freePort(true);
     for (const bool tcp : {false, true}) {  // too long for a datagram; nobody listens
         options.tcp = tcp;
-        testing::internal::CaptureStderr();
-        EXPECT_EQ(runSend(options), 1) << tcp;
-        EXPECT_NE(testing::internal::GetCapturedStderr(), "");
+        EXPECT_NE(message(), "");
     }
 }
 
-TEST(Send, OnRequestPlaysAndStopsAsTheButtonsAsk) {
-    QTemporaryDir folder;
-    qputenv("ZEPH_DATA", folder.path().toLocal8Bit());
-    const std::string file = folder.filePath("show.zcap").toStdString();
-    {
-        CaptureWriter writer(file);
-        for (std::int32_t i = 0; i < 500; ++i)
-            writer.piece(i * 10, "piece");
-    }
+TEST_F(Sending, OnRequestPlaysAndStopsAsTheButtonsAsk) {
+    qputenv("ZEPH_DATA", folder.qPath().toLocal8Bit());
+    writeCapture("show.zcap", 500, 10);
     QUdpSocket ear;
     ASSERT_TRUE(ear.bind(QHostAddress::LocalHost, 0));
-    ToolOptions made;
-    made.file = file;
-    made.port = ear.localPort();
-    made.onRequest = true;
-    std::atomic<pthread_t> thread{};
-    std::atomic<bool> running = false;
-    std::thread player([&] {
-        thread = pthread_self();
-        running = true;
-        EXPECT_EQ(runSend(made), 0);
-    });
-    const auto seqPid = [] {
+    ToolOptions options;
+    options.file = folder.path("show.zcap");
+    options.port = ear.localPort();
+    options.onRequest = true;
+    const auto pid = static_cast<std::int32_t>(QCoreApplication::applicationPid());
+    const auto registered = [] {
         const FileSettingsStore store(FileSettingsStore::userFile());
         return store.value(kSharedIpcKey, "SeqPid").value_or("0");
     };
-    const auto heard = [&](int patienceMs) {
-        int count = 0;
-        while (ear.waitForReadyRead(patienceMs)) {
-            while (ear.hasPendingDatagrams())
-                ear.readDatagram(nullptr, 0), ++count;
-            if (count >= 10) break;
-        }
-        return count;
-    };
-    while (!running || seqPid() == "0")
-        std::this_thread::sleep_for(std::chrono::milliseconds(5));
-    const auto pid = static_cast<std::int32_t>(QCoreApplication::applicationPid());
-    EXPECT_EQ(seqPid(), std::to_string(pid));
-    EXPECT_EQ(heard(100), 0) << "waits to be asked";
+    Running player([options] { return runSend(options); });
+    ASSERT_TRUE(eventually([&] { return registered() == std::to_string(pid); }));
+    EXPECT_EQ(heard(ear, 100), 0) << "waits to be asked";
     EXPECT_TRUE(sendToSequencer(pid, SequencerCommand::Start));
-    EXPECT_GE(heard(2000), 10);
+    EXPECT_GE(heard(ear, 2000), 10);
     EXPECT_TRUE(sendToSequencer(pid, SequencerCommand::Stop));
-    std::this_thread::sleep_for(std::chrono::milliseconds(100));
+    std::this_thread::sleep_for(100ms);
     while (ear.hasPendingDatagrams())
         ear.readDatagram(nullptr, 0);
-    EXPECT_EQ(heard(100), 0);
-    pthread_kill(thread, SIGTERM);
-    player.join();
-    EXPECT_EQ(seqPid(), "0") << "no longer registered";
+    EXPECT_EQ(heard(ear, 100), 0);
+    EXPECT_EQ(player.stop(SIGTERM), 0);
+    EXPECT_EQ(registered(), "0");
     qunsetenv("ZEPH_DATA");
 }

@@ -1,14 +1,11 @@
 // The headless companion as its users meet it: arguments in, text, exit status and files out.
-#include <QDir>
-#include <QFile>
+#include "tests/support/folder.h"
+
 #include <QImage>
 #include <QJsonArray>
 #include <QJsonDocument>
 #include <QJsonObject>
 #include <QProcess>
-#include <QTemporaryDir>
-
-#include <gtest/gtest.h>
 
 namespace {
 
@@ -20,18 +17,16 @@ struct Outcome {
     QJsonObject json() const { return QJsonDocument::fromJson(out).object(); }
 };
 
-Outcome tool(const QStringList& arguments, const QStringList& without = {},
-             const QList<std::pair<QString, QString>>& with = {}) {
+Outcome tool(const QStringList& arguments, const QProcessEnvironment& environment) {
     QProcess process;
-    QProcessEnvironment environment = QProcessEnvironment::systemEnvironment();
-    for (const QString& name : without)
-        environment.remove(name);
-    for (const auto& [name, value] : with)
-        environment.insert(name, value);
     process.setProcessEnvironment(environment);
     process.start(ZEPH_TOOL, arguments);
     EXPECT_TRUE(process.waitForFinished(60'000));
     return {process.exitCode(), process.readAllStandardOutput(), process.readAllStandardError()};
+}
+
+Outcome tool(const QStringList& arguments) {
+    return tool(arguments, QProcessEnvironment::systemEnvironment());
 }
 
 // One light string on the first circuit of unit 2, white on black.
@@ -47,32 +42,33 @@ constexpr const char* kDisplay = R"(<?xml version='1.0' encoding='UTF-8'?>
 </DrawObjects>
 </Zeph>)";
 
-class Tool : public testing::Test {
-protected:
+struct Tool : testing::Test {
     void SetUp() override {
-        write("roof.zee", kDisplay);
+        folder.write("roof.zee", kDisplay);
         // At 10 ms full on; at 30 ms off.
-        write("roof.zcap", "zeph-capture 1\n"
-                           "10 \\x0100100360000000010020050000.000100100\\x04\n"
-                           "30 \\x0100100360000000010020050000.000000000\\x04\n");
+        folder.write("roof.zcap", "zeph-capture 1\n"
+                                  "10 \\x0100100360000000010020050000.000100100\\x04\n"
+                                  "30 \\x0100100360000000010020050000.000000000\\x04\n");
     }
-
-    void write(const char* name, const QByteArray& text) {
-        QFile file(path(name));
-        ASSERT_TRUE(file.open(QIODevice::WriteOnly));
-        file.write(text);
+    QString path(const char* name) const { return folder.qPath(name); }
+    // A command on the roof, with its capture where it takes one.
+    QStringList roof(const char* command, const QStringList& rest = {}) const {
+        const bool plays = QString(command) == "trace" || QString(command) == "render";
+        return QStringList{command, path("roof.zee")} +
+               (plays ? QStringList{"--capture", path("roof.zcap")} : QStringList()) + rest;
     }
+    QRgb pixel(const char* picture, int x = 4, int y = 4) const { return QImage(path(picture)).pixel(x, y); }
 
-    QString path(const QString& name) const { return folder_.filePath(name); }
-
-private:
-    QTemporaryDir folder_;
+    Folder folder;
 };
+
+constexpr QRgb kLit = qRgb(255, 255, 255);
+constexpr QRgb kDark = qRgb(0, 0, 0);
 
 }  // namespace
 
-TEST_F(Tool, InfoTellsTheRecords) {
-    const Outcome run = tool({"info", path("roof.zee"), "--json"});
+TEST_F(Tool, InfoTellsTheRecordsAndWhatCouldNotBeRead) {
+    const Outcome run = tool(roof("info", {"--json"}));
     EXPECT_EQ(run.status, 0);
     const QJsonObject info = run.json();
     EXPECT_EQ(info["zephSaveFileVersion"].toString(), "3.0.0");
@@ -83,92 +79,68 @@ TEST_F(Tool, InfoTellsTheRecords) {
     EXPECT_EQ(fixture["ZOrder"].toInt(), 4);
     EXPECT_EQ(fixture["Channels"][0]["Multi"][4].toInt(), 16777215);
     EXPECT_EQ(fixture["DrawPoints"][1], (QJsonArray{2, 240, 75}));
-}
 
-TEST_F(Tool, InfoTellsWhatCouldNotBeRead) {
-    write("bad.zee", "<Other/>");
-    const Outcome run = tool({"info", path("bad.zee"), "--json"});
-    EXPECT_EQ(run.status, 1);
-    EXPECT_FALSE(run.json()["Loaded"].toBool());
-    EXPECT_EQ(run.json()["Messages"][0]["Title"].toString(), "Qen Visualizer-Not a valid file");
-    EXPECT_TRUE(run.err.startsWith("Qen Visualizer-Not a valid file | Error:  This file  '"));
-    EXPECT_TRUE(run.err.endsWith("application. / (003-Invalid Root)\n"));
+    folder.write("bad.zee", "<Other/>");
+    const Outcome bad = tool({"info", path("bad.zee"), "--json"});
+    EXPECT_EQ(bad.status, 1);
+    EXPECT_FALSE(bad.json()["Loaded"].toBool());
+    EXPECT_EQ(bad.json()["Messages"][0]["Title"].toString(), "Qen Visualizer-Not a valid file");
+    EXPECT_TRUE(bad.err.startsWith("Qen Visualizer-Not a valid file | Error:  This file  '"));
+    EXPECT_TRUE(bad.err.endsWith("application. / (003-Invalid Root)\n"));
 }
 
 TEST_F(Tool, TableTellsKeysAndPlaces) {
-    const Outcome run = tool({"table", path("roof.zee"), "--json"});
+    const Outcome run = tool(roof("table", {"--json"}));
     EXPECT_EQ(run.status, 0);
-    const QJsonObject table = run.json();
-    EXPECT_EQ(table["Entries"][0]["Key"].toInt(), 100'002'005);
-    EXPECT_EQ(table["Entries"][0]["Levels"], QJsonArray{4});
-    EXPECT_EQ(table["BulbLocations"][0]["Locs"], (QJsonArray{QJsonArray{0, 5, 5}, QJsonArray{0, 15, 5}}));
+    EXPECT_EQ(run.json()["Entries"][0]["Key"].toInt(), 100'002'005);
+    EXPECT_EQ(run.json()["Entries"][0]["Levels"], QJsonArray{4});
+    EXPECT_EQ(run.json()["BulbLocations"][0]["Locs"], (QJsonArray{QJsonArray{0, 5, 5}, QJsonArray{0, 15, 5}}));
 }
 
 TEST_F(Tool, TraceTellsEveryFrameOfTheVirtualClock) {
-    const Outcome run = tool({"trace", path("roof.zee"), "--capture", path("roof.zcap"), "--until", "50", "--json"});
+    const Outcome run = tool(roof("trace", {"--until", "50", "--json"}));
     EXPECT_EQ(run.status, 0);
     EXPECT_EQ(run.out, "{\"t\":9,\"Draws\":[]}\n"
                        "{\"t\":18,\"Draws\":[{\"Level\":4,\"Fixture\":1,\"Channel\":1,\"I\":100}]}\n"
                        "{\"t\":27,\"Draws\":[{\"Level\":4,\"Fixture\":1,\"Channel\":1,\"I\":100}]}\n"
                        "{\"t\":36,\"Draws\":[{\"Level\":4,\"Fixture\":1,\"Channel\":1,\"I\":0}]}\n"
                        "{\"t\":45,\"Draws\":[]}\n");
-    const Outcome openGl = tool(
-        {"trace", path("roof.zee"), "--capture", path("roof.zcap"), "--until", "15", "--engine", "opengl", "--json"});
-    EXPECT_EQ(openGl.out, "{\"t\":15,\"Draws\":[{\"Level\":4,\"Fixture\":1,\"Channel\":1,\"I\":100}]}\n");
+    EXPECT_EQ(tool(roof("trace", {"--until", "15", "--engine", "opengl", "--json"})).out,
+              "{\"t\":15,\"Draws\":[{\"Level\":4,\"Fixture\":1,\"Channel\":1,\"I\":100}]}\n");
 }
 
+// OpenGL without a screen: no variable that leads to one is handed on.
 TEST_F(Tool, RenderDrawsTheFirstFrameAtOrAfterATime) {
-    const auto picture = [&](const char* at) {
-        const Outcome run =
-            tool({"render", path("roof.zee"), "--capture", path("roof.zcap"), "--at", at, "--out", path("roof.png")});
-        EXPECT_EQ(run.status, 0) << run.err.constData();
-        return QImage(path("roof.png"));
-    };
-    const QImage lit = picture("10");
-    EXPECT_EQ(lit.size(), QSize(20, 10));
-    EXPECT_EQ(lit.pixel(4, 4), qRgb(255, 255, 255));  // a square of 2 x 2 around (5, 5)
-    EXPECT_EQ(lit.pixel(5, 5), qRgb(255, 255, 255));
-    EXPECT_EQ(lit.pixel(6, 5), qRgb(0, 0, 0));
-    EXPECT_EQ(lit.pixel(14, 4), qRgb(255, 255, 255));
-    EXPECT_EQ(picture("9").pixel(4, 4), qRgb(0, 0, 0));
-    EXPECT_EQ(picture("40").pixel(4, 4), qRgb(0, 0, 0));
+    QProcessEnvironment noScreen = QProcessEnvironment::systemEnvironment();
+    noScreen.remove("DISPLAY");
+    noScreen.remove("WAYLAND_DISPLAY");
+    for (const char* engine : {"standard", "opengl"}) {
+        const auto drawn = [&](const QStringList& rest) {
+            const Outcome run = tool(roof("render", QStringList{"--engine", engine} + rest), noScreen);
+            EXPECT_EQ(run.status, 0) << run.err.constData();
+        };
+        drawn({"--at", "15", "--out", path("lit.png")});
+        EXPECT_EQ(QImage(path("lit.png")).size(), QSize(20, 10));
+        EXPECT_EQ(pixel("lit.png", 4, 4), kLit) << engine;  // a square of 2 x 2 around (5, 5)
+        EXPECT_EQ(pixel("lit.png", 5, 5), kLit);
+        EXPECT_EQ(pixel("lit.png", 6, 5), kDark);
+        EXPECT_EQ(pixel("lit.png", 14, 4), kLit);
+        drawn({"--at", "9", "--out", path("early.png")});
+        EXPECT_EQ(pixel("early.png"), QString(engine) == "opengl" ? kLit : kDark) << "its first frame comes at 15";
 
-    const Outcome film = tool({"render", path("roof.zee"), "--capture", path("roof.zcap"), "--from", "0", "--to", "40",
-                               "--fps", "100", "--out", path("film/")});
-    EXPECT_EQ(film.status, 0) << film.err.constData();
-    EXPECT_EQ(QDir(path("film")).entryList({"frame*.png"}).size(), 5);
-    EXPECT_EQ(QImage(path("film/frame00002.png")).pixel(4, 4), qRgb(255, 255, 255));
-}
-
-// Without a screen: no variable that leads to one is handed on.
-TEST_F(Tool, RenderDrawsThroughOpenGLWithoutAScreen) {
-    const QStringList render{"render", path("roof.zee"), "--capture", path("roof.zcap"), "--engine",
-                             "opengl", "--at",           "15",        "--out",           path("gl.png")};
-    const Outcome run = tool(render, {"DISPLAY", "WAYLAND_DISPLAY"});
-    ASSERT_EQ(run.status, 0) << run.err.constData();
-    const QImage lit(path("gl.png"));
-    EXPECT_EQ(lit.size(), QSize(20, 10));
-    EXPECT_EQ(lit.pixel(4, 4), qRgb(255, 255, 255));
-    EXPECT_EQ(lit.pixel(5, 5), qRgb(255, 255, 255));
-    EXPECT_EQ(lit.pixel(6, 5), qRgb(0, 0, 0));
-    EXPECT_EQ(lit.pixel(14, 4), qRgb(255, 255, 255));
-
-    // Frames at 15, 30 and 45 ms for pictures at 0, 20 and 40; the command that ends at 30 is dark in the last two.
-    const QStringList film{
-        "render", path("roof.zee"), "--capture", path("roof.zcap"), "--engine", "opengl", "--from",
-        "0",      "--to",           "40",        "--fps",           "50",       "--out",  path("gl/")};
-    ASSERT_EQ(tool(film, {"DISPLAY", "WAYLAND_DISPLAY"}).status, 0);
-    EXPECT_EQ(QDir(path("gl")).entryList({"frame*.png"}).size(), 3);
-    EXPECT_EQ(QImage(path("gl/frame00001.png")).pixel(4, 4), qRgb(255, 255, 255));
-    EXPECT_EQ(QImage(path("gl/frame00003.png")).pixel(4, 4), qRgb(0, 0, 0));
+        // Frames at 9, 18, 27 ... or at 15, 30, 45; the command that ends at 30 is dark from 36, or 30, on.
+        drawn({"--from", "0", "--to", "40", "--fps", "50", "--out", path("film/")});
+        EXPECT_EQ(QDir(path("film")).entryList({"frame*.png"}).size(), 3);
+        EXPECT_EQ(pixel("film/frame00002.png"), QString(engine) == "opengl" ? kDark : kLit);
+        EXPECT_EQ(pixel("film/frame00003.png"), kDark);
+    }
 }
 
 TEST_F(Tool, TellsThatThereIsNoOpenGL) {
-    QTemporaryDir nothing;
-    const QStringList render{"render", path("roof.zee"), "--capture", path("roof.zcap"), "--engine",
-                             "opengl", "--at",           "15",        "--out",           path("gl.png")};
     // The loader of drivers is told to look where there are none.
-    const Outcome run = tool(render, {}, {{"__EGL_VENDOR_LIBRARY_DIRS", nothing.path()}});
+    QProcessEnvironment noDriver = QProcessEnvironment::systemEnvironment();
+    noDriver.insert("__EGL_VENDOR_LIBRARY_DIRS", path("none"));
+    const Outcome run = tool(roof("render", {"--engine", "opengl", "--at", "15", "--out", path("gl.png")}), noDriver);
     EXPECT_EQ(run.status, 1);
     EXPECT_TRUE(run.err.startsWith("zeph-tool: No OpenGL")) << run.err.constData();
     EXPECT_FALSE(QFile::exists(path("gl.png")));
@@ -176,8 +148,8 @@ TEST_F(Tool, TellsThatThereIsNoOpenGL) {
 
 TEST_F(Tool, ExitsWithOneForBadInputAndTwoForWrongUsage) {
     EXPECT_EQ(tool({"trace", path("roof.zee"), "--capture", path("none.zcap"), "--until", "9"}).status, 1);
-    write("bad.zcap", "zeph-capture 1\n5 a\n4 b\n");
-    const Outcome bad = tool({"trace", path("roof.zee"), "--capture", path("bad.zcap"), "--until", "9"});
+    folder.write("roof.zcap", "zeph-capture 1\n5 a\n4 b\n");
+    const Outcome bad = tool(roof("trace", {"--until", "9"}));
     EXPECT_EQ(bad.status, 1);
     EXPECT_TRUE(bad.err.contains("line 3")) << bad.err.constData();
     const Outcome usage = tool({"trace", path("roof.zee")});
@@ -187,32 +159,27 @@ TEST_F(Tool, ExitsWithOneForBadInputAndTwoForWrongUsage) {
 }
 
 TEST_F(Tool, ConvertWritesThePresentVersionAndSparesWhatIsThere) {
-    write("old.zee", QByteArray(kDisplay).replace("3.0.0", "2.1.0"));
-    const auto read = [&](const char* name) {
-        QFile file(path(name));
-        return file.open(QIODevice::ReadOnly) ? file.readAll() : QByteArray("not there");
-    };
+    folder.write("old.zee", QByteArray(kDisplay).replace("3.0.0", "2.1.0"));
     EXPECT_EQ(tool({"convert", path("old.zee"), path("new.zee")}).status, 0);
     const QJsonObject info = tool({"info", path("new.zee"), "--json"}).json();
     EXPECT_EQ(info["zephSaveFileVersion"].toString(), "3.0.0");
     EXPECT_EQ(info["Fixtures"][0]["Name"].toString(), "Roof");
-    EXPECT_TRUE(read("new.zee").contains(" Chksum=\""));
+    EXPECT_THAT(folder.read("new.zee"), testing::HasSubstr(" Chksum=\""));
 
     const Outcome refused = tool({"convert", path("old.zee"), path("old.zee")});
     EXPECT_EQ(refused.status, 1);
     EXPECT_TRUE(refused.err.endsWith("old.zee exists; --force replaces it\n")) << refused.err.constData();
-    EXPECT_TRUE(read("old.zee").contains("2.1.0"));
+    EXPECT_THAT(folder.read("old.zee"), testing::HasSubstr("2.1.0"));
     EXPECT_EQ(tool({"convert", path("old.zee"), path("old.zee"), "--force"}).status, 0);
-    EXPECT_TRUE(read("old.zee").contains("\"3.0.0\""));
+    EXPECT_THAT(folder.read("old.zee"), testing::HasSubstr("\"3.0.0\""));
 
-    write("bad.zee", QByteArray(kDisplay).replace("BulbSize", "BulbSise"));
+    folder.write("bad.zee", QByteArray(kDisplay).replace("BulbSize", "BulbSise"));
     EXPECT_EQ(tool({"convert", path("bad.zee"), path("half.zee")}).status, 1);
-    EXPECT_EQ(read("half.zee"), "not there");
+    EXPECT_EQ(folder.read("half.zee"), "not there");
     EXPECT_EQ(tool({"convert", path("new.zee"), path("no/folder.zee")}).status, 1);
 }
 
 TEST_F(Tool, DemoShowAddressesTheDisplay) {
-    EXPECT_EQ(tool({"demo-show", path("roof.zee"), "--out", path("show.zcap"), "--seconds", "5"}).status, 0);
-    const Outcome run = tool({"trace", path("roof.zee"), "--capture", path("show.zcap"), "--until", "5000"});
-    EXPECT_TRUE(run.out.contains(" L4 F1 C1 I100"));
+    EXPECT_EQ(tool(roof("demo-show", {"--out", path("roof.zcap"), "--seconds", "5"})).status, 0);
+    EXPECT_TRUE(tool(roof("trace", {"--until", "5000"})).out.contains(" L4 F1 C1 I100"));
 }

@@ -7,6 +7,7 @@
 #include <QComboBox>
 #include <QLabel>
 #include <QLineEdit>
+#include <QRegularExpression>
 #include <QSlider>
 #include <QSpinBox>
 #include <QTabWidget>
@@ -15,19 +16,16 @@
 
 namespace {
 
-struct OptionsDialog : testing::Test {
+struct OptionsDialog : testing::Test, SettingsRig {
     OptionsDialog() {
-        adapters[1] = {"Local", "127.0.0.1"};
-        adapters[2] = {"Stage", "192.168.1.20"};
-        adapters[3] = {"Spare", "0.0.0.0"};
-        link = {"Stage", "192.168.1.20", 30303, false, false};
-        settings.AdapterToUse = "Stage";
+        store.set("Adapter To Use", "Stage");
+        EXPECT_TRUE(read());
     }
     // Makes and shows the dialog on what the test has set up.
     void open() {
         const auto pick = [this](std::int32_t, const QString&, QWidget*) { return picked; };
         const OptionsDesk desk{host, [this] { ++resets; }, pick};
-        dialog = std::make_unique<frmZephOptions>(ZephOptionsDraftOf(settings, link), adapters, desk);
+        dialog = std::make_unique<frmZephOptions>(ZephOptionsDraftOf(settings, connection), adapters, desk);
         dialog->show();
     }
     template <typename Widget>
@@ -44,90 +42,9 @@ struct OptionsDialog : testing::Test {
     }
     bool accepted() const { return dialog->result() == QDialog::Accepted && !dialog->isVisible(); }
 
-    RecordingHost host;
-    ZephSettings settings;
-    Connection link;
-    ZephAdapters adapters;
     std::optional<std::int32_t> picked;
     int resets = 0;
     std::unique_ptr<frmZephOptions> dialog;
-};
-
-// Every control that stands for one setting.
-struct Check {
-    const char* name;
-    FlagField field;
-};
-// clang-format off
-constexpr auto kChecks = std::to_array<Check>({
-    {"chkTTShowToolTips", &ZephSettings::ToolTipsShow},
-    {"chkTTAlwaysShowFixture", &ZephSettings::ToolTipsAlwaysShowFixture},
-    {"chkTTAsgnProp", &ZephSettings::ToolTipsAsgnProp}, {"chkTTKeshHardware", &ZephSettings::ToolTipsKeshHardware},
-    {"chkTTKeshModes", &ZephSettings::ToolTipsKeshModes},
-    {"chkTTKeshResolution", &ZephSettings::ToolTipsKeshResolution}, {"chkTTComment", &ZephSettings::ToolTipsComment},
-    {"chkTTLevel", &ZephSettings::ToolTipsLevel}, {"chkTTLock", &ZephSettings::ToolTipsLock},
-    {"chkTTName", &ZephSettings::ToolTipsName}, {"chkTTOpacity", &ZephSettings::ToolTipsOpacity},
-    {"chkTTPoints", &ZephSettings::ToolTipsPoints}, {"chkTTPropComment", &ZephSettings::ToolTipsPropComment},
-    {"chkTTPropLock", &ZephSettings::ToolTipsPropLock}, {"chkTTPropName", &ZephSettings::ToolTipsPropName},
-    {"chkTTSize", &ZephSettings::ToolTipsSize}, {"chkTTType", &ZephSettings::ToolTipsType},
-    {"chkConfirmDeletes", &ZephSettings::ConfirmDeletes}, {"chkLEDDefault", &ZephSettings::LEDDefault},
-    {"chkPropertiesOnNewFixture", &ZephSettings::PropertiesOnNewFixture},
-    {"chkPropertiesOnEditorSelect", &ZephSettings::PropertiesOnEditorSelect},
-    {"chkPropertiesOnListSelect", &ZephSettings::PropertiesOnListSelect},
-    {"chkPropertiesOnAddPoints", &ZephSettings::PropertiesOnAddPoints},
-    {"chkPropertiesOnObjectUndo", &ZephSettings::PropertiesOnObjectUndo},
-    {"chkPropertiesOnWizard", &ZephSettings::PropertiesOnWizardUse},
-    {"chkAlwaysShowPropNames", &ZephSettings::AlwaysShowPropNames},
-    {"chkSimplePropDisplay", &ZephSettings::SimplePropDisplay},
-    {"chkReferenceReminder", &ZephSettings::ReferenceFileWarning},
-    {"chkBulbSizeWarning", &ZephSettings::BulbSizeWarning},
-    {"chkKeshBulbCountWarning", &ZephSettings::KeshBulbCountWarning}, {"chkEditInColor", &ZephSettings::EditInColor},
-    {"chkShowPixelOrder", &ZephSettings::ShowPixelOrder}, {"chkBackgroundWarning", &ZephSettings::BackgroundWarning},
-    {"chkEndStopsSimulation", &ZephSettings::EndStopsSimulation},
-    {"chkCorruptedFileWarning", &ZephSettings::NoCorruptFileWarning},
-    {"chkDisableFixtureText", &ZephSettings::DisableFixtureText},
-    {"chkCheckFileExtension", &ZephSettings::CheckFileExtension},
-    {"chkForceForward", &ZephSettings::ForceSimulationForward},
-    {"chkAdvancedRendering", &ZephSettings::AdvancedRenderEngine}, {"chkUseTCP", &ZephSettings::UseTCP},
-    {"chkFixtureNameAsChannelName", &ZephSettings::ChannelDefaultName},
-    {"chkChannelNumberAsChannelName", &ZephSettings::ChannelDefaultOrderNum},
-    {"chkRGBColorAsChannelName", &ZephSettings::ChannelDefaultRGBColor},
-    {"chkNoFixtureNamesDuringSelection", &ZephSettings::NoFixtureNamesDuringSelection},
-});
-// clang-format on
-
-struct Choice {
-    const char* name;
-    const char* text;
-    LongField field;
-    std::int32_t value;
-};
-constexpr std::array kChoices{
-    Choice{"cmbStartupOption", "Automatically Open Last File", &ZephSettings::OnStartup, 2},
-    Choice{"cmbAutoSave", "2 Hours", &ZephSettings::AutoSave, 120},
-    Choice{"cmbDefaultChannelType", "RGB", &ZephSettings::DefaultChannelType, 2},
-    Choice{"cmbShowFixtureName", "Pixel Num ONLY", &ZephSettings::FixtureTextLocation, 7},
-    Choice{"cmbBulbSize", "16", &ZephSettings::BulbSize, 16},
-    Choice{"cmbBulbSpacing", "0", &ZephSettings::BulbSpacing, 0},
-    Choice{"cmbFloodSize", "64", &ZephSettings::FloodSize, 64},
-    Choice{"cmbMaxOpacity", "5 %", &ZephSettings::FloodOpacity, 5},
-    Choice{"cmbZOrder", "16", &ZephSettings::ZOrder, 16},
-    Choice{"cmbTTNumberOfChannels", "(none)", &ZephSettings::ToolTipsNumAsgnChannels, 0},
-    Choice{"cmbTTNumberOfFixtures", "63", &ZephSettings::ToolTipsNumAsgnFixtures, 63},
-    Choice{"cmbBulbShape", "8 Point Star", &ZephSettings::BulbShape, 10},
-};
-
-struct Swatch {
-    const char* name;
-    LongField field;
-};
-constexpr std::array kSwatches{
-    Swatch{"cmdFixtureTextColor", &ZephSettings::FixtureTextColor},
-    Swatch{"cmdToolHandleColor", &ZephSettings::ToolHandleColor},
-    Swatch{"cmdVertexHandleColor", &ZephSettings::VertexHandleColor},
-    Swatch{"cmdGridLineColor", &ZephSettings::GridColor},
-    Swatch{"cmdSampleBackgroundColor", &ZephSettings::SampleBackgroundColor},
-    Swatch{"cmdSampleRGBColor", &ZephSettings::SampleRGBColor},
 };
 
 }  // namespace
@@ -151,39 +68,38 @@ TEST_F(OptionsDialog, OkWithoutAChangeGivesTheSettingsBackAsTheyWere) {
 }
 
 TEST_F(OptionsDialog, EveryControlChangesItsOwnSettingAndNoOther) {
-    ZephSettings wanted = settings;
+    write();
+    auto wanted = store.values;
+    const auto want = [&](const QString& name, const QString& value) {
+        wanted[{lowerCase(kSettingsKey), lowerCase(name.toStdString())}] = value.toStdString();
+    };
     open();
-    for (const Check& each : kChecks) {
-        find<QCheckBox>(each.name)->toggle();
-        wanted.*each.field = !(settings.*each.field);
+    static const QRegularExpression row("^(\\w+) ?\"?([^\"]*)\"? : (.+) = (.+)$");
+    for (const QString& line : tableLines("option_controls.txt")) {
+        const QStringList parts = row.match(line).capturedTexts();
+        ASSERT_EQ(parts.size(), 5) << line.toStdString();
+        const QByteArray name = parts[1].toLatin1();
+        auto* control = find<QWidget>(name);
+        if (auto* box = qobject_cast<QCheckBox*>(control)) box->toggle();
+        if (qobject_cast<QComboBox*>(control)) choose(name, parts[2].trimmed());
+        if (auto* slider = qobject_cast<QSlider*>(control)) slider->setValue(parts[2].toInt());
+        if (auto* spin = qobject_cast<QSpinBox*>(control)) spin->setValue(parts[2].toInt());
+        picked = parts[2].toInt();
+        if (qobject_cast<QPushButton*>(control)) click(name);
+        want(parts[3], parts[4]);
     }
-    for (const Choice& each : kChoices) {
-        choose(each.name, each.text);
-        wanted.*each.field = each.value;
-    }
-    for (std::int32_t color = 0x010203; const Swatch& each : kSwatches) {
-        picked = color;
-        click(each.name);
-        wanted.*each.field = color++;
-    }
-    choose("cmbAssumeNewObject", "Always");
-    wanted.AssumeNewObject = true;
-    choose("cmbAdapter", "Local");
-    wanted.AdapterToUse = "Local";
-    find<QSlider>("sldPixelFlashSpeed")->setValue(25);
-    wanted.ToolTipsPixelFlash = 25;
     EXPECT_EQ(find<QLabel>("lblPixelFlashSpeed")->text(), "1000 ms");
-    find<QSpinBox>("numStrobeFireTime")->setValue(100);
-    wanted.StrobeFireTime = 100;
     find<QTabWidget>("tabOptions")->setCurrentIndex(5);
-    wanted.LastOptsTab = 5;
+    want("Last Opts Tab", "5");
     find<QLineEdit>("txtZephPort")->setFocus();
     find<QLineEdit>("txtZephPort")->selectAll();
     QTest::keyClicks(find<QLineEdit>("txtZephPort"), "4a-0 .00x");
-    wanted.SimulationPort = 4000;
+    want("Simulation Port", "4000");
     click("cmdOK");
     ASSERT_TRUE(accepted());
-    EXPECT_EQ(dialog->draft().Settings, wanted);
+    settings = dialog->draft().Settings;
+    write();
+    EXPECT_EQ(store.values, wanted);
     EXPECT_EQ(dialog->draft().Link.ZephAdapterName, "Local");
     EXPECT_EQ(dialog->draft().Link.ZephAdapterIP, "127.0.0.1");
     EXPECT_EQ(dialog->draft().Link.ZephSimulationPort, 4000);
@@ -201,7 +117,7 @@ TEST_F(OptionsDialog, AColorThatWasNotChosenStays) {
 
 TEST_F(OptionsDialog, AWrongPortLeadsToItsField) {
     settings.LastOptsTab = 1;
-    link.ZephSimulationPort = 0;
+    connection.ZephSimulationPort = 0;
     open();
     ASSERT_TRUE(QTest::qWaitForWindowActive(dialog.get()));
     click("cmdOK");
@@ -217,8 +133,8 @@ TEST_F(OptionsDialog, AWrongPortLeadsToItsField) {
 }
 
 TEST_F(OptionsDialog, AnAdapterShowsItsAddress) {
-    link.ZephAdapterName = "Gone";
-    link.ZephAdapterIP = "127.0.0.1";
+    connection.ZephAdapterName = "Gone";
+    connection.ZephAdapterIP = "127.0.0.1";
     open();
     EXPECT_EQ(find<QComboBox>("cmbAdapter")->count(), 3);
     EXPECT_EQ(find<QComboBox>("cmbAdapter")->currentIndex(), -1);
@@ -249,6 +165,11 @@ TEST_F(OptionsDialog, CancelAndResetGiveNoDraft) {
     EXPECT_FALSE(dialog->isVisible());
     EXPECT_TRUE(dialog->wasReset());
     EXPECT_EQ(resets, 1);
+    const std::string asked = "Qen Visualizer-Reset Options to Defaults?|Are you sure you want to reset all options to "
+                              "defaults?\r\nNote: This operation will reset your entire environment\r\nincluding "
+                              "editor colors, recent files, toolbar locations, etc\n";
+    EXPECT_EQ(host.boxTexts(),
+              asked + asked + "Qen Visualizer-Reset Options to Defaults|All options reset to defaults");
 }
 
 namespace {

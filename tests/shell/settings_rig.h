@@ -6,6 +6,8 @@
 #include "tests/support/map_settings_store.h"
 #include "tests/support/recording_host.h"
 
+#include <QFile>
+
 struct SettingsRig {
     bool read() { return ZephReadRegistryDefaults(context, settings, connection, adapters); }
     void write(bool writeShutDownTime = false) { ZephWriteClosingRegistry(context, settings, writeShutDownTime); }
@@ -16,6 +18,8 @@ struct SettingsRig {
         EXPECT_TRUE(ZephReadRegistryDefaults(context, back, link, adapters));
         return back;
     }
+    // With the same surroundings.
+    RegistryContext on(SettingsStore& other) { return {other, clock, paths, failures, host, context.lister}; }
 
     MapSettingsStore store;
     ManualClock clock{100'000};
@@ -29,3 +33,12 @@ struct SettingsRig {
     Connection connection;
     ZephAdapters adapters;
 };
+
+// The lines of a table beside the tests, without remarks.
+inline QStringList tableLines(const char* name) {
+    QFile file(QString(ZEPH_TEST_DATA "/") + name);
+    EXPECT_TRUE(file.open(QIODevice::ReadOnly)) << name;
+    QStringList lines = QString::fromUtf8(file.readAll()).split('\n', Qt::SkipEmptyParts);
+    lines.removeIf([](const QString& line) { return line.startsWith('#'); });
+    return lines;
+}

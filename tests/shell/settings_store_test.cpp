@@ -1,27 +1,18 @@
 #include "shell/settings_values.h"
 #include "tests/shell/settings_rig.h"
+#include "tests/support/folder.h"
 #include "util/random_source.h"
 #include "util/settings_store.h"
-
-#include <QFile>
-#include <QTemporaryDir>
 
 namespace {
 
 struct FileStore : testing::Test {
-    void put(const QByteArray& content) {
-        QFile made(QString::fromStdString(file));
-        ASSERT_TRUE(made.open(QIODevice::WriteOnly));
-        made.write(content);
-    }
-    QByteArray content() {
-        QFile made(QString::fromStdString(file));
-        EXPECT_TRUE(made.open(QIODevice::ReadOnly));
-        return made.readAll();
-    }
+    void put(const QByteArray& content) { folder.write(name, content); }
+    QByteArray content() { return QByteArray::fromStdString(folder.read(name)); }
 
-    QTemporaryDir folder;
-    std::string file = folder.filePath("deep/settings.ini").toStdString();
+    Folder folder;
+    const char* name = "settings.ini";
+    std::string file = folder.path(name);
 };
 
 constexpr std::string_view kKey = kSettingsKey;
@@ -30,6 +21,7 @@ constexpr std::string_view kKey = kSettingsKey;
 
 TEST_F(FileStore, KeepsAnyTextUnderAnyCaseOfItsName) {
     const std::string hard = " a, b;c=\"é😀\" C:\\new\\u0041 %20 @Variant(x)\r\n[# no comment] ";
+    file = folder.path(name = "deep/settings.ini");  // in a folder that it makes
     {
         FileSettingsStore store(file);
         EXPECT_EQ(store.value(kKey, "Bulb Size"), std::nullopt);
@@ -91,7 +83,6 @@ TEST_F(FileStore, ADamagedFileGivesWhatIsLegible) {
         bool damage;           // of the file, not of a value
         std::size_t reported;  // with the damage of values
     };
-    FileSettingsStore(file).setValue(kKey, "Bulb Size", "3");  // makes the folder
     const QByteArray heading = "[Software.Kalvora.Zeph.Settings]\r\n";
     for (const Case& each :
          {Case{"; a comment = none", false, 0}, Case{"# neither", false, 0}, Case{"no equals sign", true, 1},
@@ -104,15 +95,14 @@ TEST_F(FileStore, ADamagedFileGivesWhatIsLegible) {
         put("\xef\xbb\xbf" + heading + "Bulb Size=5\r\n" + each.line + "\n" + heading + "Flood Size=7");
         FileSettingsStore store(file);
         SettingsRig rig;
-        const RegistryContext context{store, rig.clock, rig.paths, rig.failures, rig.host, rig.context.lister};
-        ASSERT_TRUE(ZephReadRegistryDefaults(context, rig.settings, rig.connection, rig.adapters));
+        ASSERT_TRUE(ZephReadRegistryDefaults(rig.on(store), rig.settings, rig.connection, rig.adapters));
         EXPECT_EQ(rig.settings.BulbSize, 5) << shown;
         EXPECT_EQ(rig.settings.FloodSize, 7) << shown;
         EXPECT_EQ(rig.settings.ZOrder, 1) << shown;
         EXPECT_EQ(!store.problem().empty(), each.damage) << shown;
         EXPECT_EQ(rig.failures.reports.size(), each.reported) << shown;
         rig.settings.ZOrder = 4;
-        ZephWriteClosingRegistry(context, rig.settings, false);
+        ZephWriteClosingRegistry(rig.on(store), rig.settings, false);
         const FileSettingsStore again(file);
         EXPECT_EQ(again.value(kKey, "Flood Size"), "7") << shown;
         EXPECT_EQ(again.value(kKey, "ZOrder"), "4") << shown;
@@ -125,8 +115,7 @@ TEST_F(FileStore, ADamagedFileGivesWhatIsLegible) {
 TEST_F(FileStore, AFileWithSpoiltBytesNeverStopsTheStart) {
     SettingsRig rig;
     FileSettingsStore whole(file);
-    ZephWriteClosingRegistry({whole, rig.clock, rig.paths, rig.failures, rig.host, rig.context.lister}, rig.settings,
-                             false);
+    ZephWriteClosingRegistry(rig.on(whole), rig.settings, false);
     const QByteArray good = content();
     SeededRandom random(7);
     for (int round = 0; round < 40; ++round) {
@@ -136,18 +125,16 @@ TEST_F(FileStore, AFileWithSpoiltBytesNeverStopsTheStart) {
                 static_cast<char>(random.next() * 256);
         put(spoilt);
         FileSettingsStore store(file);
-        const RegistryContext context{store, rig.clock, rig.paths, rig.failures, rig.host, rig.context.lister};
-        ASSERT_TRUE(ZephReadRegistryDefaults(context, rig.settings, rig.connection, rig.adapters));
+        ASSERT_TRUE(ZephReadRegistryDefaults(rig.on(store), rig.settings, rig.connection, rig.adapters));
         EXPECT_LE(rig.settings.BulbSize, 16);
         EXPECT_LE(rig.settings.SimulationPort, 65535);
     }
 }
 
 TEST_F(FileStore, APlaceThatCannotBeUsedIsReportedAndTheStartGoesOn) {
-    FileSettingsStore store(folder.path().toStdString());  // a folder, not a file
+    FileSettingsStore store(folder.path());  // a folder, not a file
     SettingsRig rig;
-    const RegistryContext context{store, rig.clock, rig.paths, rig.failures, rig.host, rig.context.lister};
-    ASSERT_TRUE(ZephReadRegistryDefaults(context, rig.settings, rig.connection, rig.adapters));
+    ASSERT_TRUE(ZephReadRegistryDefaults(rig.on(store), rig.settings, rig.connection, rig.adapters));
     ASSERT_FALSE(rig.failures.reports.empty());
     EXPECT_NE(rig.failures.reports[0].description.find("cannot be opened"), std::string::npos);
     EXPECT_EQ(rig.settings.SimulationPort, 30303);
@@ -176,12 +163,9 @@ TEST_F(FileStore, AValueIsWrittenAsItsKindOrNotAtAll) {
     EXPECT_TRUE(fWriteValue("HKLM", {kKey, "Flag", "B", "False"}, store));  // another root, another value
     EXPECT_EQ(store.get("Flag"), "True");
 
-    const std::string profile = folder.filePath("other.ini").toStdString();
+    const std::string profile = folder.path("other.ini");
     EXPECT_FALSE(fWriteValue(profile, {"Part", "Name", "S", "x"}, store));  // not there
-    QFile made(QString::fromStdString(profile));
-    ASSERT_TRUE(made.open(QIODevice::WriteOnly));
-    made.write("[Part]\nKept=1\n");
-    made.close();
+    folder.write("other.ini", "[Part]\nKept=1\n");
     EXPECT_TRUE(fWriteValue(profile, {"Part", "Name", "S", "x"}, store));
     const FileSettingsStore written(profile);
     EXPECT_EQ(written.value("Part", "Name"), "x");

@@ -1,17 +1,13 @@
 #include "shell/command_icons.h"
-#include "shell/main_window.h"
-#include "tests/shell/shell_rig.h"
+#include "tests/shell/window_rig.h"
 
-#include <QAction>
 #include <QApplication>
 #include <QCheckBox>
-#include <QLabel>
 #include <QMenu>
 #include <QMenuBar>
 #include <QScrollBar>
 #include <QSlider>
 #include <QTableWidget>
-#include <QTest>
 #include <QToolButton>
 
 namespace {
@@ -28,62 +24,33 @@ QColor firstInk(const QImage& drawn) {
 
 // The window with a document of three fixtures: "Bulb" alone on level 1, "Left" and "Right" of the prop "Pair", on a
 // canvas of 60 x 30 pixels or larger.
-struct WindowCommands : testing::Test {
-    void SetUp() override {
-        rig.start();
-        rig.startUp(window);
-    }
+struct WindowCommands : WindowRig {
     void open(int widthPixels = 60, int heightPixels = 30) {
         const auto display = std::make_unique<ZephSimulation>();
         ShellRig::buildDisplay(*display);
         display->Background.EditorWidthTwips = widthPixels * TwipsPerPixelX;
         display->Background.EditorHeightTwips = heightPixels * TwipsPerPixelY;
-        display->FixtureCount = 3;
-        for (const int fixture : {2, 3}) {
-            display->Fixtures[fixture] = display->Fixtures[1];
-            display->Fixtures[fixture].Name = fixture == 2 ? "Left" : "Right";
-            display->Fixtures[fixture].AssignedItem = 1;
-        }
-        display->Fixtures[3].ZOrder = 16;
         display->PropCount = 1;
         display->Props[1].Name = "Pair";
-        display->Props[1].AssignedCount = 2;
-        display->Props[1].Object[1] = 2;
-        display->Props[1].Object[2] = 3;
-        file = rig.save(*display, "pair.zee");
-        window.resize(1024, 700);
-        window.show();
-        ASSERT_TRUE(QTest::qWaitForWindowActive(&window));
-        ASSERT_TRUE(window.openFile(QString::fromStdString(file), false));
+        for (const char* name : {"Left", "Right"}) {
+            ZephFixture& fixture = display->Fixtures[++display->FixtureCount];
+            fixture = display->Fixtures[1];
+            fixture.Name = name;
+            ZephAddFixtureToProp(display->FixtureCount, 1, *display);
+        }
+        display->Fixtures[3].ZOrder = 16;
+        WindowRig::open(*display, "pair.zee");
     }
-    template <typename Object>
-    Object* find(const char* name) {
-        auto* object = window.findChild<Object*>(name);
-        EXPECT_NE(object, nullptr) << name;
-        return object;
-    }
-    void key(Qt::Key pressed, Qt::KeyboardModifiers held = Qt::NoModifier) {
-        QTest::keyClick(&window, pressed, held);
-        QCoreApplication::processEvents();
-    }
-    void clickRow(int row) {
-        auto* list = find<QTableWidget>("flgObjectSelect");
-        QTest::mouseClick(list->viewport(), Qt::LeftButton, {}, list->visualItemRect(list->item(row, 0)).center());
-    }
+    QTableWidget* list() { return find<QTableWidget>("flgObjectSelect"); }
+    QPoint rowCentre(int row) { return list()->visualItemRect(list()->item(row, 0)).center(); }
+    void clickRow(int row) { QTest::mouseClick(list()->viewport(), Qt::LeftButton, {}, rowCentre(row)); }
     QStringList rows() {
-        auto* list = find<QTableWidget>("flgObjectSelect");
         QStringList texts;
-        for (int row = 0; row < list->rowCount(); ++row)
-            texts.append(list->item(row, 0)->text());
+        for (int row = 0; row < list()->rowCount(); ++row)
+            texts.append(list()->item(row, 0)->text());
         return texts;
     }
-    QString panel(int number) { return find<QLabel>(qPrintable(QString("StatusBar1Panel%1").arg(number)))->text(); }
     bool pressed(const char* button) { return find<QToolButton>(button)->isChecked(); }
-
-    WindowHost host;
-    ShellRig rig{host};
-    frmZephMain window{rig.program, host};
-    std::string file;
 };
 
 }  // namespace
@@ -156,12 +123,12 @@ TEST_F(WindowCommands, KeysAndButtonsChangeTheMode) {
     QTest::mouseClick(find<QCheckBox>("chkSimplePropMode"), Qt::LeftButton, {}, QPoint(8, 8));
     EXPECT_EQ(rows(), (QStringList{"Bulb", "Pair\n(Left)", "Pair\n(Right)"}));
 
-    QTest::mouseClick(find<QToolButton>("chkCmdFixtureOrProp(1)"), Qt::LeftButton);
+    click<QToolButton>("chkCmdFixtureOrProp(1)");
     EXPECT_TRUE(pressed("chkCmdFixtureOrProp(1)"));  // stays pressed
-    QTest::mouseClick(find<QToolButton>("DrawToolBar(3)"), Qt::LeftButton);
+    click<QToolButton>("DrawToolBar(3)");
     EXPECT_EQ(panel(2), "Select Fixture");
     EXPECT_TRUE(pressed("chkCmdFixtureOrProp(0)"));
-    QTest::mouseClick(find<QToolButton>("DrawToolBar(3)"), Qt::LeftButton);
+    click<QToolButton>("DrawToolBar(3)");
     EXPECT_TRUE(pressed("DrawToolBar(3)"));
 }
 
@@ -175,12 +142,11 @@ TEST_F(WindowCommands, TheListAndTabSelect) {
     EXPECT_EQ(panel(2), "Fixture Selected:Bulb - Layer:1");
     key(Qt::Key_Backtab, Qt::ShiftModifier);
     EXPECT_EQ(panel(2), "Fixture Selected:Right - Layer:16");
-    auto* list = find<QTableWidget>("flgObjectSelect");
-    QTest::mouseClick(list->viewport(), Qt::RightButton, {}, list->visualItemRect(list->item(1, 0)).center());
-    QTest::mousePress(list->viewport(), Qt::LeftButton, {}, list->visualItemRect(list->item(0, 0)).center());
-    QTest::mouseMove(list->viewport(), list->visualItemRect(list->item(1, 0)).center());
-    QTest::mouseRelease(list->viewport(), Qt::LeftButton, {}, list->visualItemRect(list->item(1, 0)).center());
-    EXPECT_EQ(list->selectedItems(), QList<QTableWidgetItem*>{list->item(2, 0)});
+    QTest::mouseClick(list()->viewport(), Qt::RightButton, {}, rowCentre(1));
+    QTest::mousePress(list()->viewport(), Qt::LeftButton, {}, rowCentre(0));
+    QTest::mouseMove(list()->viewport(), rowCentre(1));
+    QTest::mouseRelease(list()->viewport(), Qt::LeftButton, {}, rowCentre(1));
+    EXPECT_EQ(list()->selectedItems(), QList<QTableWidgetItem*>{list()->item(2, 0)});
     key(Qt::Key_F2);
     EXPECT_EQ(rig.program.editor.ZephSelection.Object, 0);
     EXPECT_EQ(find<QAction>("mnuObjectProperties")->text(), "Prop Properties");
@@ -229,10 +195,8 @@ TEST_F(WindowCommands, ScrollsInPerCentAndInASimulationInPixels) {
     key(Qt::Key_Escape);
     EXPECT_EQ(bar->maximum(), 100);
     EXPECT_EQ(window.size(), QSize(1024, 700));
-}
 
-TEST_F(WindowCommands, ASmallCanvasStandsInTheMiddleWithoutBars) {
-    open();
+    open();  // a small canvas stands in the middle without bars
     EXPECT_FALSE(find<QScrollBar>("HScroll1")->isVisible());
     EXPECT_FALSE(find<QScrollBar>("VScroll1")->isVisible());
     const QRect room = find<QFrame>("picViewport")->contentsRect();
@@ -251,8 +215,7 @@ TEST_F(WindowCommands, TheBrightnessIsTakenOverOnceTheSliderRests) {
     EXPECT_EQ(rig.program.simulation->Background.PicIntensity, 100);
     QTest::qWait(800);
     EXPECT_EQ(rig.program.simulation->Background.PicIntensity, 0);
-    const QImage canvas = find<QWidget>("picMain")->grab().toImage();
-    EXPECT_EQ(canvas.pixelColor(55, 25), QColor(0, 0, 0));
+    EXPECT_EQ(canvasAt(55, 25), QColor(0, 0, 0));
 }
 
 TEST_F(WindowCommands, TheRecentFileOpensAgain) {

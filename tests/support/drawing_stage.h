@@ -1,30 +1,15 @@
-// Displays for tests of drawing surfaces: small ones put together by hand, and random ones with everything that a file
-// may hold, together with the calls of their frames.
+// Displays for tests of drawing surfaces: small ones, and random ones with everything that a file may hold, together
+// with the calls of their frames.
 #pragma once
 
 #include "engine/standard_surface.h"
-#include "tests/support/hand_tables.h"
+#include "tests/support/compiled_display.h"
+#include "tests/support/masks.h"
 #include "util/color.h"
 #include "util/random_source.h"
 
-#include <algorithm>
 #include <array>
-#include <memory>
 #include <optional>
-#include <vector>
-
-inline const ZephMasks& masks() {
-    static const std::unique_ptr<ZephMasks> made = [] {
-        auto all = std::make_unique<ZephMasks>();
-        ZephDimmingCurve curve;
-        for (std::size_t i = 0; i < curve.size(); ++i)
-            curve[i] = static_cast<std::uint8_t>(i);
-        ZephSetUpMasks(
-            curve, [](std::string_view) {}, *all);
-        return all;
-    }();
-    return *made;
-}
 
 inline QImage noisyPicture(int width, int height, SeededRandom& random) {
     QImage picture(width, height, QImage::Format_RGB32);
@@ -35,36 +20,32 @@ inline QImage noisyPicture(int width, int height, SeededRandom& random) {
     return picture;
 }
 
-// A document with everything that a surface needs, and a table copy for each surface that draws it.
-struct Stage {
-    std::unique_ptr<ZephSimulation> document = std::make_unique<ZephSimulation>();
-    std::unique_ptr<ZephFixtureStates> states = std::make_unique<ZephFixtureStates>();
+// A display with the images of its bulbs, on a picture; each surface that draws it takes a copy of the tables.
+struct Stage : CompiledDisplay {
     std::unique_ptr<ZephStaticBulbs> bulbs = std::make_unique<ZephStaticBulbs>();
-    ZephRenderTables tables;
     QImage background;
 
-    ZephFixture& add(std::int32_t type, std::int32_t channelType, std::int32_t size, std::int32_t shape) {
-        ZephFixture& fixture = document->Fixtures[++document->FixtureCount];
-        fixture.Fixture_Type = type;
-        fixture.Channel_Type = channelType;
+    // A fixture of plain look with one channel, or three circuits, on a unit of its own.
+    ZephFixture& addLit(std::int32_t type, std::int32_t size, std::int32_t shape, std::initializer_list<Place> places,
+                        std::int32_t color = kWhite) {
+        ZephFixture& fixture = add(type, places);
         fixture.BulbSize = size;
         fixture.BulbShape = shape;
-        fixture.ChannelCount = channelType == kChannelRgb ? 3 : 1;
-        fixture.ZOrder = 1;
+        addChannel(fixture, simulation->FixtureCount, 1, color);
         return fixture;
     }
 
-    static void addPoint(ZephFixture& fixture, std::int32_t type, std::int32_t xPixels, std::int32_t yPixels) {
-        fixture.DrawPoints[++fixture.PointCount] = {type, xPixels * TwipsPerPixelX, yPixels * TwipsPerPixelY};
-    }
-
     void finish() {
-        buildHandTables(*document, tables, *states);
-        ZephRebuildStaticFixtureBulbs(*document, masks(), *bulbs);
+        build();
+        ZephRebuildStaticFixtureBulbs(*simulation, masks(), *bulbs);
+    }
+    void blank(int width, int height, QRgb color = qRgb(0, 0, 0)) {
+        background = QImage(width, height, QImage::Format_RGB32);
+        background.fill(color);
     }
 
     SurfaceScene scene(const ZephRenderTables& used) const {
-        return {*document, used, *states, masks(), *bulbs, background};
+        return {*simulation, used, *states, masks(), *bulbs, background};
     }
 };
 
@@ -110,7 +91,8 @@ public:
         std::vector<Call> calls;
         for (std::int32_t level = 1; level <= kLevels; ++level) {
             for (const ZephRenderSlot& slot : tables.Slots) {
-                if (slot.Level == level && !slot.isRGB() && pick(1, 100) <= share) calls.push_back(channelCall(slot));
+                const bool plain = !slot.isRGB() && slot.KeshMagic == 0;
+                if (slot.Level == level && plain && pick(1, 100) <= share) calls.push_back(channelCall(slot));
             }
             for (const ZephRenderSlot& slot : tables.Slots) {
                 if (slot.Level == level && slot.isRGB() && slot.Channel == 1 && pick(1, 100) <= share) {
@@ -139,36 +121,40 @@ private:
         const std::int32_t drawn = pick(1, 5);
         const std::int32_t type = drawn == kFixtureFlood && !everyShape_ ? kFixtureBulbs : drawn;
         const bool rgb = type >= kFixtureKesh || pick(1, 3) == 1;
-        const std::int32_t size = type == kFixtureFlood ? pick(0, 66) : pick(1, 3) == 1 ? pick(0, 17) : pick(1, 4);
-        ZephFixture& fixture = add(type, rgb ? kChannelRgb : kChannelNormal, size,
-                                   pick(0, 60) == 0 ? 99
-                                   : everyShape_    ? pick(1, 11)
-                                                    : 3);
+        ZephFixture& fixture = add(type, {});
+        const std::int32_t unit = simulation->FixtureCount;
+        fixture.BulbSize = type == kFixtureFlood ? pick(0, 66) : pick(1, 3) == 1 ? pick(0, 17) : pick(1, 4);
+        fixture.BulbShape = pick(0, 60) == 0 ? 99 : everyShape_ ? pick(1, 11) : 3;
         fixture.ZOrder = pick(1, 4);
         fixture.BulbSpacing = pick(0, 4);
-        if (type == kFixtureStrings && !rgb) fixture.ChannelCount = pick(1, 5);
-        for (std::int32_t c = 1; c <= fixture.ChannelCount; ++c) {
-            fixture.Channels[c].Color = pick(0, kWhite);
-            if (!rgb) fixture.Channels[c].Sub_Type = pick(0, 2);
-            fixture.Channels[c].Sub_Parm = pick(-1, 7);
-            for (std::int32_t k = 1; k <= kMaxMultiColors; ++k)
-                fixture.Channels[c].Multi[k] = pick(0, kWhite);
-        }
+        fixture.Kesh.Base_Unit = fixture.DMX.Universe = unit;
+        if (type < kFixtureKesh && rgb) makeRgb(fixture, unit, 1);
+        if (!rgb) addRandomChannels(fixture, unit);
         for (int points = pick(1, 30); points > 0; --points) {
             const std::int32_t kind = type == kFixtureStrings ? (pick(1, 5) == 1 ? kPointMove : kPointLine)
                                       : pick(1, 8) == 1       ? kPointPlaceHolder
                                                               : kPointBulb;
             const bool far = type != kFixtureStrings && pick(1, 20) == 1;
             const std::int32_t reach = far ? 140'000'000 : 70;
-            addPoint(fixture, kind, pick(-reach, background.width() + reach / 2),
-                     pick(-reach, background.height() + reach / 2));
+            addPoint(fixture, kind,
+                     {pick(-reach, background.width() + reach / 2), pick(-reach, background.height() + reach / 2)});
+        }
+    }
+
+    void addRandomChannels(ZephFixture& fixture, std::int32_t unit) {
+        for (int count = fixture.Fixture_Type == kFixtureStrings ? pick(1, 5) : 1; count > 0; --count) {
+            ZephChannel& channel = addChannel(fixture, unit, count, pick(0, kWhite));
+            channel.Sub_Type = pick(0, 2);
+            channel.Sub_Parm = pick(-1, 7);
+            for (std::int32_t& color : channel.Multi)
+                color = pick(0, kWhite);
         }
     }
 
     Call channelCall(const ZephRenderSlot& slot) {
         Call call;
         call.channel = ChannelDraw{slot.Level, slot.Fixture, slot.Channel, 0, randomAlpha()};
-        if (document->Fixtures[slot.Fixture].Channels[slot.Channel].Sub_Type == kSpecialStrobes) {
+        if (simulation->Fixtures[slot.Fixture].Channels[slot.Channel].Sub_Type == kSpecialStrobes) {
             const ZephFixtureState& state = (*states)[slot.Fixture];
             call.lit.resize(
                 static_cast<std::size_t>(state.BulbLocations[static_cast<std::size_t>(slot.Channel)].Count + 1));
@@ -180,7 +166,7 @@ private:
 
     Call groupCall(const ZephRenderSlot& slot) {
         Call call;
-        const std::int32_t type = document->Fixtures[slot.Fixture].Fixture_Type;
+        const std::int32_t type = simulation->Fixtures[slot.Fixture].Fixture_Type;
         call.group = GroupDraw{slot.Level, slot.Fixture, slot.RGBIndex, slot.Triplet, pick(1, kWhite), randomAlpha()};
         for (std::size_t c = 1; c <= 3; ++c)
             call.levels[c] = pick(0, 40);

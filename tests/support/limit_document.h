@@ -1,5 +1,5 @@
-// The displays that tests and benchmarks share: the largest document that the limits allow, and a typical one. Built
-// by rule, so that every run on every machine sees the same records.
+// The largest display that the limits allow, shared by tests and benchmarks. Built by rule, so that every run on every
+// machine sees the same records.
 #pragma once
 
 #include "model/simulation.h"
@@ -20,7 +20,3 @@ struct LimitDocumentOptions {
 // a light string has exactly as many bulbs as points, none of them on the line's end. With the defaults: 262,144 round
 // bulbs in 16,384 channels of 16 bulbs each, every channel with a controller address of its own.
 void buildLimitDocument(ZephSimulation& simulation, const LimitDocumentOptions& options = {});
-
-// Fills an empty document with a front yard on 1280 x 960 pixels: 30 light strings with strobes, Multi Color and RGB
-// among them, 4 floods, 6 groups of single bulbs, 2 ribbons of 50 pixels and a string of 100 DMX pixels, in 6 props.
-void buildTypicalDocument(ZephSimulation& simulation);

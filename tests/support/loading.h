@@ -2,9 +2,8 @@
 #pragma once
 
 #include "model/editor_loader.h"
+#include "tests/support/folder.h"
 #include "tests/support/recording_host.h"
-
-#include <QTemporaryDir>
 
 #include <memory>
 
@@ -28,10 +27,9 @@ public:
 
 // One document with its surroundings, in a folder that goes when it goes.
 struct LoadBench {
-    QTemporaryDir folder;
-    std::string folderPath = folder.path().toStdString() + "/";
+    Folder folder;
     ZephSettings settings;
-    ZephPathService paths{folderPath};
+    ZephPathService paths{folder.path()};
     RecordingHost host;
     CollectingFailures failures;
     CountingWatcher watcher;
@@ -40,8 +38,13 @@ struct LoadBench {
 
     LoadBench() { name("display.zee"); }
     void name(std::string fileName) {
-        simulation->FilePath = folderPath;
+        simulation->FilePath = folder.path();
         simulation->FileName = std::move(fileName);
     }
     std::string path() const { return simulation->FilePath + simulation->FileName; }
+    // Of the file under that name, and of a text as if it were the file.
+    bool load() { return ZephLoadVisualizerXML(true, context, *simulation); }
+    bool read(std::string_view text, TextReading reading = TextReading::QuickThenGeneral) {
+        return loadEditorText(text, reading, true, context, *simulation);
+    }
 };

@@ -33,6 +33,14 @@ public:
     void showCompileErrors(std::string_view text) override { compileErrors.emplace_back(text); }
     void pumpEvents() override { ++pumps; }
 
+    // "title|text" of each box, a line each.
+    std::string boxTexts() const {
+        std::string lines;
+        for (const Box& box : boxes)
+            lines += (lines.empty() ? "" : "\n") + box.title + "|" + box.text;
+        return lines;
+    }
+
     std::vector<Box> boxes;
     std::deque<BoxAnswer> answers;
     std::array<std::string, 5> panels;  // 1..4
@@ -48,6 +56,8 @@ public:
         std::string description;
         std::string procedure;
         int line;
+
+        bool operator==(const Report&) const = default;
     };
     void ErrReport(std::string_view description, std::string_view procedure, int line) override {
         reports.push_back({std::string(description), std::string(procedure), line});

@@ -2,8 +2,6 @@
 #include "util/message_host.h"
 #include "util/text.h"
 
-#include <gtest/gtest.h>
-
 TEST(ParseLong, TakesTrimmedDecimalsOf32BitsOnly) {
     EXPECT_EQ(parseLong(" -12 "), -12);
     EXPECT_EQ(parseLong("+7"), 7);

@@ -1,3 +1,4 @@
+#include "tests/support/folder.h"
 #include "tests/support/recording_host.h"
 #include "util/clock.h"
 #include "util/color.h"
@@ -8,30 +9,17 @@
 #include "util/random_source.h"
 #include "util/rounding.h"
 
-#include <QDir>
-#include <QTemporaryDir>
-
-#include <gtest/gtest.h>
-
+#include <cmath>
 #include <csignal>
-#include <fstream>
-#include <regex>
 
-TEST(Rounding, TiesGoToTheEvenNeighbour) {
-    EXPECT_EQ(roundHalfEven(0.5), 0);
-    EXPECT_EQ(roundHalfEven(1.5), 2);
-    EXPECT_EQ(roundHalfEven(-2.5), -2);
+TEST(Rounding, TiesGoToTheEvenNeighbourAndTooMuchSaturates) {
+    for (const auto& [value, whole] :
+         {std::pair{0.5, 0}, {1.5, 2}, {-2.5, -2}, {1e12, 2147483647}, {-1e12, -2147483647 - 1}, {std::nan(""), 0}})
+        EXPECT_EQ(roundHalfEven(value), whole) << value;
     EXPECT_EQ(floorToInt(-0.5), -1);
     EXPECT_EQ(truncateToInt(-0.5), 0);
-    EXPECT_EQ(divideHalfEven(50 * 255, 100), 128);  // 127.5
-    EXPECT_EQ(divideHalfEven(10 * 255, 100), 26);   // 25.5
-    EXPECT_EQ(divideHalfEven(30 * 255, 100), 76);   // 76.5
-}
-
-TEST(Rounding, SaturatesWhatDoesNotFit) {
-    EXPECT_EQ(roundHalfEven(1e12), 2147483647);
-    EXPECT_EQ(roundHalfEven(-1e12), -2147483647 - 1);
-    EXPECT_EQ(roundHalfEven(std::nan("")), 0);
+    for (const auto& [percent, level] : {std::pair{50, 128}, {10, 26}, {30, 76}})  // 127.5, 25.5, 76.5
+        EXPECT_EQ(divideHalfEven(percent * 255, 100), level);
 }
 
 TEST(ApplyIntensity, KeepsTheColourAbove250AndScalesBelow) {
@@ -48,18 +36,17 @@ TEST(OneBased, ChecksNumbersFromOutside) {
 }
 
 TEST(Random, TheSameSeedGivesTheSameNumbersInRange) {
-    SeededRandom first(1);
-    SeededRandom second(1);
-    SeededRandom other(2);
-    bool differs = false;
-    for (int i = 0; i < 1000; ++i) {
-        const int value = ZephReturnRandomNumber(1, 17, first);
-        EXPECT_GE(value, 1);
-        EXPECT_LE(value, 17);
-        EXPECT_EQ(value, ZephReturnRandomNumber(1, 17, second));
-        differs = differs || value != ZephReturnRandomNumber(1, 17, other);
-    }
-    EXPECT_TRUE(differs);
+    const auto numbers = [](std::uint64_t seed) {
+        SeededRandom random(seed);
+        std::vector<int> drawn(1000);
+        for (int& value : drawn)
+            value = ZephReturnRandomNumber(1, 17, random);
+        return drawn;
+    };
+    EXPECT_THAT(numbers(1), testing::Each(testing::AllOf(testing::Ge(1), testing::Le(17))));
+    EXPECT_THAT(numbers(1), testing::IsSupersetOf({1, 17}));
+    EXPECT_EQ(numbers(1), numbers(1));
+    EXPECT_NE(numbers(1), numbers(2));
 }
 
 TEST(SystemClock, IsNeverZeroAndPositiveAtTheStart) {
@@ -89,46 +76,28 @@ TEST(Guard, ReportsTheProcedureAndTheLineOfTheFailure) {
 }
 
 TEST(ErrorLog, ShowsOnlyTheFirstReportOfARunAndOnlyWithTheSwitch) {
-    QTemporaryDir folder;
-    const std::string file = folder.filePath("errorlog.txt").toStdString();
+    const Folder folder;
     RecordingHost host;
-    ErrorLog log(file, true, host);
+    ErrorLog log(folder.path("log"), true, host);
     log.ErrReport("one\r\nmore", "Zeph.modTest.a", 12);
     log.ErrReport("two", "Zeph.modTest.b", 13);
-    ASSERT_EQ(host.boxes.size(), 1u);
-    EXPECT_EQ(host.boxes[0].title, "Qen Visualizer-Errors Logged");
-    EXPECT_EQ(host.boxes[0].text, "Errors have been logged to file:\r\n" + file);
-
-    std::ifstream lines(file);
-    std::string first;
-    std::string second;
-    std::string none;
-    std::getline(lines, first);
-    std::getline(lines, second);
-    EXPECT_FALSE(std::getline(lines, none));
-    EXPECT_TRUE(
-        std::regex_match(first, std::regex(R"(\d{4}-\d\d-\d\d \d\d:\d\d:\d\d:Zeph\.modTest\.a-12 \(one / more\))")));
-    EXPECT_TRUE(second.ends_with(":Zeph.modTest.b-13 (two)"));
-
-    ErrorLog silent(folder.filePath("no/such/folder.txt").toStdString(), false, host);
+    ErrorLog silent(folder.path("no/such/folder.txt"), false, host);
     silent.ErrReport("three", "Zeph.modTest.c", 1);
-    EXPECT_EQ(host.boxes.size(), 1u);
+    EXPECT_EQ(host.boxTexts(),
+              "Qen Visualizer-Errors Logged|Errors have been logged to file:\r\n" + folder.path("log"));
+    EXPECT_THAT(folder.read("log"),
+                testing::MatchesRegex("[0-9]{4}-[0-9]{2}-[0-9]{2} [0-9]{2}:[0-9]{2}:[0-9]{2}:"
+                                      "Zeph.modTest.a-12 .one / more.\n.*:Zeph.modTest.b-13 .two.\n"));
 }
 
 TEST(FaultLog, WritesTheNameOfTheFaultAndLetsItGoItsWay) {
-    QTemporaryDir folder;
-    const std::string file = folder.filePath("errorlog.txt").toStdString();
-    EXPECT_EXIT(
-        {
-            installFaultLog(file);
-            raise(SIGILL);
-        },
-        testing::KilledBySignal(SIGILL), "");
-    std::ifstream lines(file);
-    std::string line;
-    std::getline(lines, line);
-    EXPECT_TRUE(std::regex_match(line, std::regex(R"(\d{4}-\d\d-\d\d \d\d:\d\d:\d\d:Illegal Instruction)"))) << line;
-
+    const Folder folder;
+    const auto fault = [&] {
+        installFaultLog(folder.path("log"));
+        raise(SIGILL);
+    };
+    EXPECT_EXIT(fault(), testing::KilledBySignal(SIGILL), "");
+    EXPECT_THAT(folder.read("log"), testing::MatchesRegex("[-0-9]{10} [:0-9]{8}:Illegal Instruction\n"));
     EXPECT_EQ(faultName(SIGFPE, FPE_INTDIV), "Integer Divide By Zero");
     EXPECT_EQ(faultName(SIGSEGV, 0), "Access Violation");
     EXPECT_EQ(faultName(SIGUSR1, 0), "Unknown (&H0000000A)");
@@ -147,11 +116,10 @@ TEST(Paths, StoredFormIsReversibleBelowTheBaseAndWholeElsewhere) {
 }
 
 TEST(Paths, StartUpMakesTheFoldersThatAreMissing) {
-    QTemporaryDir folder;
-    const ZephPathService paths(folder.filePath("new/base").toStdString());
+    const Folder folder;
+    const ZephPathService paths(folder.path("new/base"));
     EXPECT_TRUE(ZephCheckDirectoriesAtStartup(paths));
     EXPECT_TRUE(ZephCheckDirectoriesAtStartup(paths));
-    for (const char* name : {"Editor", "Fixtures", "Props", "Curves", "Bulbs", "System"}) {
-        EXPECT_TRUE(QDir(QString::fromStdString(paths.GetPath(kPathBase)) + name).exists()) << name;
-    }
+    EXPECT_EQ(QDir(folder.qPath("new/base")).entryList(QDir::Dirs | QDir::NoDotAndDotDot),
+              (QStringList{"Bulbs", "Curves", "Editor", "Fixtures", "Props", "Shared", "System"}));
 }
