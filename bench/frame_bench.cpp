@@ -2,6 +2,7 @@
 // pixman drawing the same images at the same opacities, and a plain loop over pixels. Levels change in every frame.
 #include "bench/bench_display.h"
 #include "bench/bench_report.h"
+#include "bench/peers.h"
 #include "engine/standard_surface.h"
 #include "tests/support/fixtures.h"
 #include "tests/support/limit_document.h"
@@ -15,7 +16,6 @@
 #include <cstdio>
 #include <cstdlib>
 #include <memory>
-#include <pixman.h>
 #include <string>
 
 namespace {
@@ -43,18 +43,6 @@ QImage gradient() {
         auto* row = reinterpret_cast<std::uint32_t*>(picture.scanLine(y));
         for (int x = 0; x < picture.width(); ++x) {
             row[x] = 0xFF000000U | static_cast<std::uint32_t>(x * 11 + y * 7) * 2654435761U >> 8;
-        }
-    }
-    return picture;
-}
-
-QImage asPicture(const BulbImage& image) {
-    const int side = 2 * image.Mask->Size;
-    QImage picture(side, side, QImage::Format_ARGB32_Premultiplied);
-    for (int y = 0; y < side; ++y) {
-        auto* row = reinterpret_cast<std::uint32_t*>(picture.scanLine(y));
-        for (int x = 0; x < side; ++x) {
-            row[x] = coveredPixel(image.Color, image.Mask->Coverage[static_cast<std::size_t>(y * side + x)]);
         }
     }
     return picture;
@@ -149,42 +137,26 @@ double painterFrame(Scene& scene) {
 }
 
 double pixmanFrame(Scene& scene) {
-    const auto wrap = [](QImage& picture, pixman_format_code_t format) {
-        return pixman_image_create_bits_no_clear(format, picture.width(), picture.height(),
-                                                 reinterpret_cast<std::uint32_t*>(picture.bits()),
-                                                 static_cast<int>(picture.bytesPerLine()));
-    };
     QImage canvasPixels = scene.background.copy();
     QImage backgroundPixels = scene.background.copy();
-    pixman_image_t* canvas = wrap(canvasPixels, PIXMAN_x8r8g8b8);
-    pixman_image_t* background = wrap(backgroundPixels, PIXMAN_x8r8g8b8);
-    std::vector<pixman_image_t*> sprites;
+    const PixmanImage canvas = pixmanView(canvasPixels, PIXMAN_x8r8g8b8);
+    const PixmanImage background = pixmanView(backgroundPixels, PIXMAN_x8r8g8b8);
+    std::vector<PixmanImage> sprites;
     for (Scene::Channel& channel : scene.channels)
-        sprites.push_back(wrap(channel.picture, PIXMAN_a8r8g8b8));
-    std::vector<pixman_image_t*> alphas;
-    for (std::uint32_t a = 0; a < 256; ++a) {
-        const pixman_color_t color{0, 0, 0, static_cast<std::uint16_t>(a * 257)};
-        alphas.push_back(pixman_image_create_solid_fill(&color));
-    }
+        sprites.push_back(pixmanView(channel.picture, PIXMAN_a8r8g8b8));
+    const std::vector<PixmanImage> opacities = pixmanOpacities();
     std::uint32_t frame = 0;
-    const double time = medianMicroseconds(
+    return medianMicroseconds(
         kPeerRuns, [&] { scene.setLevels(++frame, 1); },
         [&] {
-            pixman_image_composite32(PIXMAN_OP_SRC, background, nullptr, canvas, 0, 0, 0, 0, 0, 0, canvasPixels.width(),
-                                     canvasPixels.height());
+            pixman_image_composite32(PIXMAN_OP_SRC, background.get(), nullptr, canvas.get(), 0, 0, 0, 0, 0, 0,
+                                     canvasPixels.width(), canvasPixels.height());
             forEachLitBulb(scene, [&](const Scene::Channel& channel, std::int32_t x, std::int32_t y) {
                 const auto index = static_cast<std::size_t>(&channel - scene.channels.data());
-                pixman_image_composite32(PIXMAN_OP_OVER, sprites[index], alphas[channel.draw.Alpha], canvas, 0, 0, 0, 0,
-                                         x, y, 2 * channel.radius, 2 * channel.radius);
+                pixman_image_composite32(PIXMAN_OP_OVER, sprites[index].get(), opacities[channel.draw.Alpha].get(),
+                                         canvas.get(), 0, 0, 0, 0, x, y, 2 * channel.radius, 2 * channel.radius);
             });
         });
-    for (pixman_image_t* image : sprites)
-        pixman_image_unref(image);
-    for (pixman_image_t* image : alphas)
-        pixman_image_unref(image);
-    pixman_image_unref(background);
-    pixman_image_unref(canvas);
-    return time;
 }
 
 double loopFrame(Scene& scene) {
@@ -195,15 +167,7 @@ double loopFrame(Scene& scene) {
         [&] {
             std::copy_n(scene.background.constBits(), scene.background.sizeInBytes(), canvas.bits());
             forEachLitBulb(scene, [&](const Scene::Channel& channel, std::int32_t left, std::int32_t top) {
-                const std::uint32_t alpha = channel.draw.Alpha;
-                const std::int32_t side = channel.picture.width();
-                for (std::int32_t y = std::max(0, -top); y < std::min(side, canvas.height() - top); ++y) {
-                    const auto* from = reinterpret_cast<const std::uint32_t*>(channel.picture.constScanLine(y));
-                    auto* to = reinterpret_cast<std::uint32_t*>(canvas.bits() + (top + y) * canvas.bytesPerLine());
-                    for (std::int32_t x = std::max(0, -left); x < std::min(side, canvas.width() - left); ++x) {
-                        to[left + x] = blendPixelReference(from[x], to[left + x], alpha);
-                    }
-                }
+                blendPlainly(channel.picture, channel.draw.Alpha, left, top, canvas);
             });
         });
 }

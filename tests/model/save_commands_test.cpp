@@ -82,6 +82,17 @@ TEST(Saving, AsksWhereNoBackUpCanBeMade) {
     }
 }
 
+TEST(Saving, KeepsTheOldFileWhereItsBackUpFails) {
+    SaveBench bench;
+    bench.openOldFile();
+    bench.simulation->FileName = std::string(246, 'x') + ".zee";  // no room for ".bak0001" in a name
+    bench.folder.write(bench.simulation->FileName, kOldFile);
+    bench.saveNow();
+    EXPECT_EQ(bench.host.boxTexts(), "Unable to create backup|Unable to create backup G3 Zeph file.");
+    EXPECT_EQ(bench.folder.read(bench.simulation->FileName), kOldFile);
+    EXPECT_TRUE(bench.simulation->SimulationDirty && bench.simulation->FileUpgraded);
+}
+
 TEST(Saving, UnderANewNameLeavesTheOldFileAlone) {
     SaveBench bench;
     bench.openOldFile();
