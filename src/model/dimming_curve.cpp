@@ -1,6 +1,7 @@
 #include "model/dimming_curve.h"
 
 #include "model/source_text.h"
+#include "model/xml_check.h"
 #include "model/xml_node.h"
 
 #include <numeric>
@@ -17,7 +18,7 @@ std::size_t byteAttribute(const XmlNode& node, std::string_view name, SourceLine
 
 void readCurve(SourceText text, FailureReport& failures, ZephDimmingCurve& curve) {
     pugi::xml_document document;
-    const bool decoded = decodeSource(text);
+    const bool decoded = decodeSource(text) && checkXml(text);
     const std::string_view utf8 = text.view();
     const bool parsed =
         decoded && document.load_buffer(utf8.data(), utf8.size(), pugi::parse_default, pugi::encoding_utf8);

@@ -3,6 +3,7 @@
 #pragma once
 
 #include "model/source_text.h"
+#include "model/xml_check.h"
 #include "model/xml_node.h"
 #include "model/xml_scanner.h"
 
@@ -32,6 +33,7 @@ RootReading readRoot(SourceText& text, TextReading reading, Before before, Use u
         if (reading == TextReading::QuickOnly) return RootReading::Unusual;
     }
     if (!stays && !decodeSource(text)) return RootReading::Malformed;
+    if (!checkXml(text)) return RootReading::Malformed;  // a text that stays has no DOCTYPE and is not changed
     pugi::xml_document document;
     const std::string_view utf8 = text.view();
     const pugi::xml_parse_result parsed =

@@ -61,8 +61,9 @@ bool decodeSource(SourceText& text) {
     const std::string_view bytes = text.view();
     const QByteArrayView raw(bytes.data(), static_cast<qsizetype>(bytes.size()));
     const auto recode = [&](QStringConverter::Encoding encoding) {
-        QStringDecoder decoder(encoding);
+        QStringDecoder decoder(encoding, QStringConverter::Flag::Stateless);
         const QString decoded = decoder(raw);
+        if (decoder.hasError()) return false;
         text = SourceText(decoded.toUtf8().toStdString());
         return true;
     };

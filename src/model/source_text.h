@@ -31,5 +31,6 @@ private:
 
 // Turns the text into UTF-8 without a byte order mark. The encoding is told by the mark, by the zero bytes around the
 // first '<', or by the XML declaration: UTF-8, UTF-16 and UTF-32 of either byte order, US-ASCII, ISO-8859-1. False for
-// an encoding that cannot be read. Bytes that are no UTF-8 stay as they are: a name's odd byte is not worth the file.
+// an encoding that cannot be read, and for wide text that is none in its encoding. UTF-8 is not looked at here: the
+// readers of the text do that on their way.
 [[nodiscard]] bool decodeSource(SourceText& text);

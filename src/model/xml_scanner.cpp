@@ -1,5 +1,9 @@
 #include "model/xml_scanner.h"
 
+#include "model/xml_text.h"
+
+#include <QByteArrayView>
+
 #include <array>
 #include <bit>
 #include <cstring>
@@ -53,11 +57,12 @@ constexpr std::uint64_t bytesEqual(std::uint64_t bytes, char letter) noexcept {
 }
 
 // The first character that ends a plain piece of a value: a quote, '&', or what no usual value has. Eight at a time;
-// the zero bytes behind the text end it.
-const char* endOfValuePart(const char* at) noexcept {
+// the zero bytes behind the text end it. The bits of all bytes seen, a few behind the end among them, go into seen.
+const char* endOfValuePart(const char* at, std::uint64_t& seen) noexcept {
     static_assert(std::endian::native == std::endian::little, "the first character is taken for the lowest byte");
     for (;; at += 8) {
         const std::uint64_t bytes = eightBytes(at);
+        seen |= bytes;
         const std::uint64_t ends =
             bytesBelow(bytes, ' ') | bytesEqual(bytes, '"') | bytesEqual(bytes, '&') | bytesEqual(bytes, '<');
         if (ends != 0) return at + std::countr_zero(ends) / 8;
@@ -107,6 +112,11 @@ bool passPlainPoint(const char*& at, Slot slot, Type type, X x, Y y) noexcept {
     }
     at += 3;
     return true;
+}
+
+// Whether a document may hold the value, which is not all ASCII. Kept out of the loop as well.
+[[gnu::noinline]] bool isDocumentText(std::string_view value) noexcept {
+    return QByteArrayView(value.data(), static_cast<qsizetype>(value.size())).isValidUtf8() && !holdsForbidden(value);
 }
 
 struct Entity {
@@ -260,7 +270,7 @@ void XmlScanner::readStartTag() {
     }
 }
 
-// The name and "=\"" behind it. False when it is none, or the second of its name: the general parser takes the first.
+// The name and "=\"" behind it. False when it is none, or the second of its name, which makes the document no XML.
 bool XmlScanner::takeAttributeName(Frame& entered, std::string_view& name) {
     const auto count = static_cast<std::size_t>(entered.attributeCount);
     if (entered.attributeCount < entered.known) {
@@ -288,8 +298,9 @@ bool XmlScanner::readAttribute(Frame& entered) {
     if (!takeAttributeName(entered, name)) return false;
     const char* first = at_;
     bool hasEntity = false;
+    std::uint64_t seen = 0;
     for (;;) {
-        at_ = endOfValuePart(at_);
+        at_ = endOfValuePart(at_, seen);
         if (*at_ != '&') break;
         const Entity* entity = findEntity({at_, static_cast<std::size_t>(end_ - at_)});
         if (!entity) return false;
@@ -297,8 +308,9 @@ bool XmlScanner::readAttribute(Frame& entered) {
         at_ += entity->spelling.size();
     }
     if (*at_ != '"') return false;
-    entered.attributes[static_cast<std::size_t>(entered.attributeCount)] = {
-        name, {first, static_cast<std::size_t>(at_ - first)}, hasEntity};
+    const std::string_view value(first, static_cast<std::size_t>(at_ - first));
+    if ((seen & (kEachByte * 0x80)) != 0 && !isDocumentText(value)) return false;
+    entered.attributes[static_cast<std::size_t>(entered.attributeCount)] = {name, value, hasEntity};
     ++entered.attributeCount;
     ++at_;
     return true;

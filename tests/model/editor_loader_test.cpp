@@ -150,6 +150,35 @@ TEST(Loading, WideEncodingsReadLikeUtf8) {
     }
 }
 
+TEST(Loading, WhatIsNoXmlIsRefused) {
+    LoadBench bench;
+    const auto loads = [&](std::string_view before, std::string_view name, std::string_view behind) {
+        const std::string text =
+            std::string(before)
+                .append(
+                    "<Zeph zephSaveFileVersion=\"2.1.0\"><Items><Item ID=\"1\" Locked=\"True\" Comment=\"\" Name=\"")
+                .append(name)
+                .append("\"/></Items></Zeph>")
+                .append(behind);
+        const bool loaded = loadEditorText(text, TextReading::QuickThenGeneral, true, bench.context, *bench.simulation);
+        EXPECT_EQ(loaded, bench.host.boxes.empty());
+        for (const auto& box : bench.host.boxes)
+            EXPECT_NE(box.text.find("(002-Invalid XML)"), std::string::npos) << box.text;
+        bench.host.boxes.clear();
+        return loaded;
+    };
+    EXPECT_TRUE(loads("", "\xC3\xA4&#228;", "<!-- end -->"));
+    EXPECT_TRUE(loads("<!DOCTYPE Zeph [<!ENTITY tree \"fir\">]>", "a &tree;", ""));
+    EXPECT_EQ(bench.simulation->Props[1].Name, "a fir");
+    for (const char* name : {"a & b", "&tree;", "a<b", "a\" Name=\"b", "\xFF", "\xED\xA0\x80", "\xEF\xBF\xBE", "\x01",
+                             "&#1;", "&#xD800;", "a\" x:y=\""})
+        EXPECT_FALSE(loads("", name, "")) << name;
+    for (const char* behind : {"x", "<Zeph/>", "<![CDATA[]]>", "<!-- -- -->"})
+        EXPECT_FALSE(loads("", "", behind)) << behind;
+    EXPECT_FALSE(loads("x", "", ""));
+    EXPECT_FALSE(loads(" <?xml version='1.0'?>", "", ""));
+}
+
 TEST(Loading, AStoredDocumentIsReadIntoTheRecordsAsTheyStand) {
     LoadBench bench;
     buildDisplay(*bench.simulation);

@@ -156,6 +156,12 @@ TEST_F(Tool, ExitsWithOneForBadInputAndTwoForWrongUsage) {
     EXPECT_EQ(usage.status, 2);
     EXPECT_TRUE(usage.err.contains("usage: zeph-tool trace"));
     EXPECT_EQ(tool({"--help"}).status, 0);
+    QProcess full;
+    full.setStandardOutputFile("/dev/full");
+    full.start(ZEPH_TOOL, {"info", path("roof.zee"), "--json"});
+    ASSERT_TRUE(full.waitForFinished());
+    EXPECT_EQ(full.exitCode(), 1);
+    EXPECT_TRUE(full.readAllStandardError().contains("could not be written"));
 }
 
 TEST_F(Tool, ConvertWritesThePresentVersionAndSparesWhatIsThere) {

@@ -7,6 +7,7 @@
 #include "programs/tool/send_command.h"
 #include "programs/tool/table_command.h"
 #include "programs/tool/trace_command.h"
+#include "util/failure.h"
 
 #include <QCoreApplication>
 
@@ -47,7 +48,10 @@ int main(int argc, char** argv) {
     }
     const QCoreApplication application(argc, argv);
     try {
-        return runCommand(parsed.options);
+        const int status = runCommand(parsed.options);
+        // A full disk shows only here, for what was printed waits in the stream's buffer.
+        require(std::fflush(stdout) == 0 && std::ferror(stdout) == 0, "the result could not be written");
+        return status;
     } catch (const std::exception& failure) {
         std::fprintf(stderr, "zeph-tool: %s\n", failure.what());
         return 1;
