@@ -395,8 +395,12 @@ void StandardSurface::fetchItem(const BulbItem& item) const noexcept {
     constexpr std::int32_t kFetchedRows = 4;
     const std::int32_t first = std::max(0, std::int32_t{item.Place.Y});
     const std::int32_t end = std::min(plan_.Height, item.Place.Y + kFetchedRows);
+    // A row may lie on two cache lines.
+    const std::int32_t last = item.Place.X + kFetchedRows - 1;
     for (std::int32_t y = first; y < end; ++y) {
-        __builtin_prefetch(frame_.row(y) + item.Place.X, 1, 3);
+        const std::uint32_t* const row = frame_.row(y);
+        __builtin_prefetch(row + item.Place.X, 1, 3);
+        __builtin_prefetch(row + last, 1, 3);
     }
 }
 
