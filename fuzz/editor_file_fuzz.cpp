@@ -1,25 +1,15 @@
 // Any bytes as an editor file: both forms of reading must agree on the records, the boxes and the reports, and what
 // was read must survive being written and read again.
+#include "fuzz/reading_rig.h"
 #include "model/editor_writer.h"
-#include "tests/support/recording_host.h"
 
 #include <cstdlib>
-#include <memory>
 
 namespace {
 
-struct Reader {
-    ZephSettings settings;
-    ZephPathService paths{"/base"};
-    RecordingHost host;
-    CollectingFailures failures;
-    NoWatcher watcher;
-    EditorFileContext context{settings, paths, host, failures, watcher};
-    std::unique_ptr<ZephSimulation> simulation = std::make_unique<ZephSimulation>();
-
+struct Reader : ReadingRig {
     bool read(std::string_view text, TextReading reading) {
-        host.boxes.clear();
-        failures.reports.clear();
+        forgetWhatWasTold();
         return loadEditorText(text, reading, true, context, *simulation);
     }
     // Everything that a reader leaves behind, as text.

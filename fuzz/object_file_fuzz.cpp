@@ -1,11 +1,10 @@
 // Any bytes as a fixture file and as a prop file: both forms of reading must agree, what fails is taken back, and what
 // was read must survive being written and read again.
+#include "fuzz/reading_rig.h"
 #include "model/editor_writer.h"
 #include "model/object_files.h"
-#include "tests/support/recording_host.h"
 
 #include <cstdlib>
-#include <memory>
 
 namespace {
 
@@ -13,21 +12,13 @@ void check(bool condition) {
     if (!condition) std::abort();
 }
 
-struct Reader {
-    ZephSettings settings;
-    ZephPathService paths{"/base"};
-    RecordingHost host;
-    CollectingFailures failures;
-    NoWatcher watcher;
-    EditorFileContext context{settings, paths, host, failures, watcher};
-    std::unique_ptr<ZephSimulation> simulation = std::make_unique<ZephSimulation>();
+struct Reader : ReadingRig {
     bool channelsSeen = false;
 
     bool read(std::string_view text, TextReading reading, bool prop) {
         empty();
         simulation->FixtureLedDefault = false;
-        host.boxes.clear();
-        failures.reports.clear();
+        forgetWhatWasTold();
         return prop ? loadPropFileText(text, reading, context, *simulation, channelsSeen)
                     : loadFixtureFileText(text, reading, context, *simulation, channelsSeen);
     }
