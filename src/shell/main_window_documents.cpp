@@ -69,5 +69,5 @@ void frmZephMain::documentReplaced(bool backgroundChanged) {
     }
     ZephLoadUIObjectList();
     redrawObjects();
-    CoolBar1_->band().show(ZephSetOptionsToolbandStuff(program_.settings, *program_.simulation));
+    showOptionsBand();
 }
