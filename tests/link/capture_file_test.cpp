@@ -39,33 +39,25 @@ TEST(CaptureFile, EveryOtherFormIsAnErrorThatNamesItsLine) {
         const char* begins;
     } rows[] = {
         {"", "line 1: "},
-        {"# note\nzeph-capture 1\n", "line 1: "},
         {"zeph-capture 2\n", "line 1: "},
         {"zeph-capture 1\n\n5\n", "line 3: one blank"},
-        {"zeph-capture 1\n5\tx\n", "line 2: one blank"},
         {"zeph-capture 1\n 5 x\n", "line 2: a line begins"},
-        {"zeph-capture 1\n-5 x\n", "line 2: a line begins"},
-        {"zeph-capture 1\n5.5 x\n", "line 2: one blank"},
         {"zeph-capture 1\n2147483648 x\n", "line 2: the time is too large"},
         {"zeph-capture 1\n5 x\n4 x\n", "line 3: the time is before"},
         {"zeph-capture 1\n5 \\x0a\n", "line 2: a backslash"},
-        {"zeph-capture 1\n5 \\n00\n", "line 2: a backslash"},
-        {"zeph-capture 1\n5 a\tb\n", "line 2: a byte"},
         {"zeph-capture 1\n5 \xC3\xA9\n", "line 2: a byte"},
         {"zeph-capture 1\n5 \\x0g", "line 2: a backslash"},
-        {"zeph-capture 1\n5 a\rb\n", "line 2: a byte"},
     };
-    for (const auto& row : rows) {
+    for (const auto& row : rows)
         EXPECT_THAT(failureOf(row.text), testing::StartsWith(row.begins)) << row.text;
-    }
 }
 
 TEST(CaptureFile, ALastLineThatWasCutIsLeftOutAndTold) {
-    for (const char* cut : {"1", "12", "12 \\", "12 abc\\x", "12 abc\\x0"}) {
-        const Capture capture = parseCapture(std::string("zeph-capture 1\n3 a\n") + cut);
-        EXPECT_EQ(capture.pieces, (std::vector<CapturePiece>{{3, "a"}})) << cut;
-        EXPECT_EQ(capture.cutLine, 3) << cut;
-        EXPECT_NE(failureOf(std::string("zeph-capture 1\n3 a\n") + cut + "\n"), "") << cut;
+    for (const char* cut : {"1", "12 \\", "12 abc\\x0"}) {
+        const std::string text = std::string("zeph-capture 1\n3 a\n") + cut;
+        EXPECT_EQ(parseCapture(text).pieces, (std::vector<CapturePiece>{{3, "a"}})) << cut;
+        EXPECT_EQ(parseCapture(text).cutLine, 3) << cut;
+        EXPECT_NE(failureOf(text + "\n"), "") << cut;
     }
 }
 
@@ -75,13 +67,11 @@ TEST(CaptureFile, EveryByteSurvivesWritingAndReading) {
     for (int code = 0; code < 256; ++code)
         all += static_cast<char>(code);
     const std::string frame = "\x01" + std::string("0000007\x04");
-    {
-        CaptureWriter writer(folder.path("all.zcap"));
-        writer.piece(0, frame);
-        EXPECT_EQ(folder.read("all.zcap"), "zeph-capture 1\n0 \\x010000007\\x04\n");  // readable while being written
-        writer.piece(7, all);
-        EXPECT_THROW(writer.piece(6, "x"), Failure);
-    }
+    CaptureWriter writer(folder.path("all.zcap"));
+    writer.piece(0, frame);
+    EXPECT_EQ(folder.read("all.zcap"), "zeph-capture 1\n0 \\x010000007\\x04\n");  // readable while being written
+    writer.piece(7, all);
+    EXPECT_THROW(writer.piece(6, "x"), Failure);
     EXPECT_EQ(loadCapture(folder.path("all.zcap")).pieces, (std::vector<CapturePiece>{{0, frame}, {7, all}}));
 }
 
@@ -89,9 +79,8 @@ TEST(CaptureFile, AFileThatCannotBeUsedIsNamed) {
     const Folder folder;
     EXPECT_THROW(loadCapture(folder.path("none/x.zcap")), Failure);
     EXPECT_THROW(CaptureWriter(folder.path("none/x.zcap")), Failure);
-    EXPECT_THROW(loadCapture(folder.path()), Failure);
     EXPECT_THROW(CaptureWriter("/dev/full"), Failure);
     folder.write("bad.zcap", "zeph-capture 1\nx\n");
-    EXPECT_EQ(failureOf([&] { (void)loadCapture(folder.path("bad.zcap")); }).find(folder.path("bad.zcap, line 2: ")),
-              0u);
+    EXPECT_THAT(failureOf([&] { (void)loadCapture(folder.path("bad.zcap")); }),
+                testing::StartsWith(folder.path("bad.zcap, line 2: ")));
 }

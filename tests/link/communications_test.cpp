@@ -22,10 +22,6 @@ struct Communications : testing::Test {
 
 using Strings = std::vector<std::string>;
 
-AdapterLister machineOf(std::vector<ZephAdapter> machine) {
-    return [machine] { return machine; };
-}
-
 }  // namespace
 
 TEST_F(Communications, UdpBindsTheChosenAdapterOnceAndTunesTheBufferOnEachCall) {
@@ -50,24 +46,20 @@ TEST_F(Communications, AnUnknownAdapterFallsBackToLocalAndTcpListensOnAllAddress
 }
 
 TEST_F(Communications, EachFailureIsToldAndTriedAgainNextTime) {
-    struct Row {
+    const struct {
         std::function<void()> spoil;
         const char* box;
         bool open;
         std::size_t reports;
-    };
-    const Row rows[] = {
+    } rows[] = {
         {[&] { connection.ZephAdapterName = "wlan0"; },
          "(SetUpCommunications:  No IP)\r\nThere is a problem with your selected network adapter.", false, 0},
         {[&] { socket.taken = true; }, "Port 30303 is already in use", false, 1},
         {[&] { socket.openFailure = "The address is protected"; },
          "Port 30303 cannot be opened: The address is protected", false, 1},
-        {[&] {
-             socket.bufferAnswer = {22, 0};
-         },
-         "Error setting SO_BROADCAST option: 22", true, 0},
+        {[&] { socket.bufferAnswer.systemError = 22; }, "Error setting SO_BROADCAST option: 22", true, 0},
     };
-    for (const Row& row : rows) {
+    for (const auto& row : rows) {
         socket = {};
         connection = {};
         host.boxes.clear();
@@ -77,10 +69,9 @@ TEST_F(Communications, EachFailureIsToldAndTriedAgainNextTime) {
         EXPECT_EQ(connection.ZephPortOpen, row.open) << row.box;
         EXPECT_THAT(host.boxTexts(), testing::StartsWith(std::string("Qen Visualizer-Port Error|") + row.box));
         EXPECT_EQ(host.boxes.at(0).icon, BoxIcon::Critical);
-        ASSERT_EQ(failures.reports.size(), row.reports) << row.box;
-        if (row.reports > 0) {
-            EXPECT_EQ(failures.reports[0].procedure, "Zeph.modZephCommunications.ZephSetUpCommunications");
-        }
+        EXPECT_EQ(failures.reports.size(), row.reports) << row.box;
+        for (const CollectingFailures::Report& report : failures.reports)
+            EXPECT_EQ(report.procedure, "Zeph.modZephCommunications.ZephSetUpCommunications");
         socket = {};
         connection.ZephAdapterName = "eth0";
         EXPECT_TRUE(setUp()) << row.box;
@@ -105,33 +96,30 @@ TEST_F(Communications, ArrivalMovesEverythingAndGaugesTheLengthFromBefore) {
 TEST(Adapters, FillTheSlotsInOrderAndTheFirstEqualNameWins) {
     RecordingHost host;
     ZephAdapters adapters;
-    const AdapterLister lister = machineOf({{"eth0", "10.0.0.1"}, {"eth0", "10.0.0.2"}, {"Eth0", "10.0.0.3"}});
+    std::vector<ZephAdapter> machine{{"eth0", "10.0.0.1"}, {"eth0", "10.0.0.2"}, {"Eth0", "10.0.0.3"}};
+    const AdapterLister lister = [&] { return machine; };
     EXPECT_EQ(ZephLoadAdaptersAndReturnIP("eth0", lister, host, adapters), "10.0.0.1");
     EXPECT_EQ(ZephLoadAdaptersAndReturnIP("Eth0", lister, host, adapters), "10.0.0.3");
-    EXPECT_EQ(ZephLoadAdaptersAndReturnIP("", lister, host, adapters), "127.0.0.1");
     EXPECT_EQ(adapters[1], (ZephAdapter{"Local", "127.0.0.1"}));
     EXPECT_EQ(adapters[4], (ZephAdapter{"Eth0", "10.0.0.3"}));
-    EXPECT_EQ(adapters[5], ZephAdapter{});
-    EXPECT_EQ(ZephLoadAdaptersAndReturnIP("Eth0", machineOf({}), host, adapters), "127.0.0.1");
+    machine.clear();
+    EXPECT_EQ(ZephLoadAdaptersAndReturnIP("Eth0", lister, host, adapters), "127.0.0.1");
     EXPECT_EQ(adapters[2], ZephAdapter{});  // rebuilt, not added to
-}
 
-TEST(Adapters, MoreThanTheSlotsHoldIsTold) {
-    std::vector<ZephAdapter> machine;
-    for (int count = 1; count <= 40; ++count) {
-        RecordingHost host;
-        ZephAdapters adapters;
-        machine.push_back({"a" + std::to_string(count), "10.0.0." + std::to_string(count)});
-        EXPECT_EQ(ZephLoadAdaptersAndReturnIP("a31", machineOf(machine), host, adapters),
-                  count < 31 ? "127.0.0.1" : "10.0.0.31");
-        EXPECT_EQ(host.boxTexts(), count <= 31 ? ""
-                                               : "Qen Visualizer-Error|Your system has more than 32 network adapters.  "
-                                                 "Only the first 32 will be used.");
-    }
+    machine.resize(31);
+    machine.back() = {"last", "10.0.0.31"};
+    EXPECT_EQ(ZephLoadAdaptersAndReturnIP("last", lister, host, adapters), "10.0.0.31");
+    EXPECT_EQ(host.boxTexts(), "");
+    machine.resize(32);
+    EXPECT_EQ(ZephLoadAdaptersAndReturnIP("last", lister, host, adapters), "10.0.0.31");
+    EXPECT_EQ(host.boxTexts(), "Qen Visualizer-Error|Your system has more than 32 network adapters.  "
+                               "Only the first 32 will be used.");
 }
 
 TEST(Adapters, TheStartUpCheckChoosesAndWarns) {
-    const AdapterLister lister = machineOf({{"eth0", "10.0.0.1"}, {"wlan0", "0.0.0.0"}, {"odd", ""}});
+    const auto lister = [] {
+        return std::vector<ZephAdapter>{{"eth0", "10.0.0.1"}, {"wlan0", "0.0.0.0"}, {"odd", ""}};
+    };
     const struct {
         const char* stored;
         const char* name;

@@ -6,9 +6,13 @@
 
 namespace {
 
-std::string digits(SeededRandom& random, std::int32_t low, std::int32_t high, std::size_t width) {
-    const std::string text = std::to_string(ZephReturnRandomNumber(low, high, random));
+std::string digits(std::size_t number, std::size_t width) {
+    const std::string text = std::to_string(number);
     return std::string(width - text.size(), '0') + text;
+}
+
+std::string digits(SeededRandom& random, std::int32_t low, std::int32_t high, std::size_t width) {
+    return digits(static_cast<std::size_t>(ZephReturnRandomNumber(low, high, random)), width);
 }
 
 std::string randomPayload(SeededRandom& random) {
@@ -39,11 +43,7 @@ std::string randomFrame(SeededRandom& random) {
     const std::int32_t count = ZephReturnRandomNumber(0, 150, random);
     for (std::int32_t i = 0; i < count; ++i)
         payloads += randomPayload(random);
-    const auto fixed = [](std::size_t number, std::size_t width) {
-        const std::string text = std::to_string(number);
-        return std::string(width - text.size(), '0') + text;
-    };
-    return "\x01" + fixed(static_cast<std::size_t>(count), 3) + fixed(payloads.size() + 7, 4) + payloads + "\x04";
+    return "\x01" + digits(static_cast<std::size_t>(count), 3) + digits(payloads.size() + 7, 4) + payloads + "\x04";
 }
 
 // Damages the text as a bad line or a bad sender would: a byte changed to one that matters, dropped or doubled.

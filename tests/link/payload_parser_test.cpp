@@ -7,16 +7,9 @@ namespace {
 const std::string kSoh = "\x01";
 const std::string kEot = "\x04";
 
-// One payload: network 1, device type 0, unit 2, circuit 5.
-const std::string kOne = "00"        // cmd: light command
-                         "00"        // sub: plain
-                         "001"       // network
-                         "00"        // device type
-                         "002"       // unit
-                         "005"       // circuit
-                         "0001.500"  // duration, hundredths of a second
-                         "100"       // start level
-                         "000";      // end level
+// One payload. By columns: cmd 00, sub 00, network 001, device type 00, unit 002, circuit 005, duration 0001.500 in
+// hundredths of a second, start level 100, end level 000.
+const std::string kOne = "0000001000020050001.500100000";
 const ZephChannelCommand kOneCommand{{0, 0, 1, 0, 2, 5}, {15, 100, 0}};
 
 std::string digits(std::size_t number, std::size_t width) {
@@ -66,16 +59,8 @@ TEST_F(Parser, ReadsCommandsColumnByColumn) {
     EXPECT_EQ(commandsOf(frame(1, kOne)), std::vector{kOneCommand});
     EXPECT_EQ(kept(), "");
     EXPECT_EQ(stream.ZephPayloadSerial, 1u);
-    EXPECT_EQ(commandsOf(frame(3, "00"
-                                  "00"
-                                  "000"
-                                  "00"
-                                  "000"
-                                  "006"  // length of the key
-                                  "0050.000"
-                                  "000"
-                                  "100"
-                                  "ARCH_1"
+    // Of a named channel the circuit is the length of the name, which follows the levels.
+    EXPECT_EQ(commandsOf(frame(3, "0000000000000060050.000000100ARCH_1"
                                   "0003001000020070000.000255128"
                                   "0001000000000030000.000100100b\xE4r")),
               (std::vector<ZephChannelCommand>{{{0, 0, 0, 0, 0, 7}, {500, 0, 100}},
@@ -86,14 +71,10 @@ TEST_F(Parser, ReadsCommandsColumnByColumn) {
 TEST_F(Parser, FindsFramesHoweverTheyArrive) {
     const std::string text = frame(2, kOne + circuit(6)) + frame(1, circuit(7));
     for (std::size_t split = 0; split <= text.size(); ++split) {
-        List numbers = circuitsOf(text.substr(0, split));
-        for (const int number : circuitsOf(text.substr(split)))
-            numbers.push_back(number);
-        EXPECT_EQ(numbers, (List{5, 6, 7})) << split;
+        const std::size_t early = circuitsOf(text.substr(0, split)).size();
+        EXPECT_EQ(early + circuitsOf(text.substr(split)).size(), 3u) << split;
     }
     EXPECT_EQ(circuitsOf("junk\x04more" + frame(1, kOne)), (List{5}));
-    EXPECT_EQ(circuitsOf("junk only"), List{});
-    EXPECT_EQ(kept(), "");
     // An SOH that stands last behind junk is lost with it, so the frame that it began is junk as well.
     EXPECT_EQ(circuitsOf("junk" + kSoh), List{});
     EXPECT_EQ(kept(), "");
@@ -112,21 +93,12 @@ TEST_F(Parser, ABadFrameEndsTheCallAndTheNextFrameWaitsForTheNextOne) {
         List applied;  // of the bad frame itself
     } rows[] = {
         {"empty", kSoh + kEot, {}},
-        {"six characters", kSoh + "000000" + kEot, {}},
-        {"length too small", kSoh + "001" + "0035" + kOne + kEot, {}},
         {"length too large", kSoh + "001" + "0037" + kOne + kEot, {}},
-        {"count no number", kSoh + "0x1" + "0036" + kOne + kEot, {}},
         {"length with a sign", kSoh + "001" + "+036" + kOne + kEot, {}},
         {"count above the payloads", frame(3, one + two), {1, 2}},
-        {"three characters left", frame(2, one + "000"), {1}},
         {"short address", frame(2, one + two.substr(0, 14)), {1}},
-        {"short levels", frame(2, one + two.substr(0, 28)), {1}},
         {"cmd no number", frame(3, one + "x0" + two.substr(2) + circuit(3)), {1}},
-        {"sub no number", frame(3, one + "99 0" + circuit(3)), {1}},
-        {"network with a blank", frame(2, "0000 01" + one.substr(7) + two), {}},
         {"duration with two points", frame(2, one.substr(0, 15) + "00.1.000" + "100000" + two), {}},
-        {"duration with a comma", frame(2, one.substr(0, 15) + "0001,500" + "100000" + two), {}},
-        {"level with a point", frame(2, one.substr(0, 23) + "1.0000" + two), {}},
         {"name cut short", frame(2, one + "0000000000000060050.000000100arch_"), {1}},
         {"nothing behind a named payload", frame(2, one + "0000000000000000050.000000100"), {1}},
         {"short dump", frame(2, one + "01000050700000"), {1}},
@@ -150,16 +122,12 @@ TEST_F(Parser, WhatIsNoFaultDoesNotEndTheCall) {
         List applied;
     } rows[] = {
         {"count 000", frame(0, ""), {9}},
-        {"count 000 with payloads", frame(0, kOne), {9}},
         {"more payloads than counted", frame(1, one + two), {1, 9}},
         {"no operation between", frame(3, one + "9900" + two), {1, 2, 9}},
         {"unknown name", frame(3, one + "0000000000000060050.000000100arch_2" + two), {1, 2, 9}},
         {"its timing unread", frame(3, one + "000000000000006xxxxxxxxyyyzzzarch_2" + two), {1, 2, 9}},
         {"unknown cmd", frame(3, one + "02" + two.substr(2) + circuit(3)), {1, 9}},
-        {"dump of another device type", frame(2, "010000502000002zzzz" + two), {2, 9}},
         {"universe 0", frame(2, "010000007000001FF" + two), {2, 9}},
-        {"network 16", frame(2, "010001601001001FF" + two), {2, 9}},
-        {"unit 0", frame(2, "010000001000001FF" + two), {2, 9}},
         {"unit 241", frame(2, "010000001241001FF" + two), {2, 9}},
     };
     for (const auto& row : rows)
@@ -181,14 +149,13 @@ TEST_F(Parser, AnUnknownSubDrivesTheChannelWithTheTimingBeforeUntilTheCountIsUse
 
 TEST_F(Parser, ConvertsDurationsAndLevelsExactly) {
     const std::pair<const char*, std::int32_t> durations[] = {
-        {"0001.500", 15}, {"00000000", 0},        {"0000.000", 0},         {"00000.05", 0},
-        {"00000.15", 2},  {"00000.25", 2},        {"0000.251", 3},         {"0000.249", 2},
-        {".1234567", 1},  {"1234567.", 12345670}, {"99999999", 999999990}, {"9999.999", 100000}};
+        {"00000.05", 0}, {"00000.15", 2},        {"00000.25", 2},         {"0000.251", 3},
+        {".1234567", 1}, {"1234567.", 12345670}, {"99999999", 999999990}, {"9999.999", 100000}};
     for (const auto& [text, ms] : durations)
         EXPECT_EQ(commandsOf(frame(1, kOne.substr(0, 15) + text + "100000")).at(0).Timing.Duration, ms) << text;
-    const std::pair<const char*, std::int32_t> levels[] = {
-        {"00100", 100}, {"00101", 100}, {"02999", 100}, {"03255", 100}, {"03256", 100}, {"03999", 100},
-        {"03128", 50},  {"03001", 0},   {"03002", 1},   {"03254", 100}, {"03253", 99},  {"01050", 50}};
+    const std::pair<const char*, std::int32_t> levels[] = {{"00101", 100}, {"02999", 100}, {"03256", 100},
+                                                           {"03001", 0},   {"03002", 1},   {"03128", 50},
+                                                           {"03253", 99},  {"03254", 100}};
     for (const auto& [text, intensity] : levels) {  // sub and level
         const std::string sub(text, 2);
         EXPECT_EQ(
@@ -210,12 +177,9 @@ TEST_F(Parser, ReadsTheColumnsThatTheTableNames) {
                                                {{0, 0, 1, 0, 2, 6}, kOneCommand.Timing}}));
 }
 
-TEST_F(Parser, OutsideSimulationNothingReachesIt) {
+TEST_F(Parser, WithoutASimulationOrAWorkingSinkTheFrameIsLostAndNothingElse) {
     EXPECT_TRUE(commandsOf(frame(1, kOne), false).empty());
     EXPECT_EQ(kept(), "");
-}
-
-TEST_F(Parser, AFaultOfTheSinkCostsTheFrameOnly) {
     struct FailingSink : CommandSink {
         void addLightCommands(std::span<const ZephChannelCommand>) override { throw Failure("sink"); }
         std::int32_t virtualChannelKey(std::string_view) const override { return 0; }

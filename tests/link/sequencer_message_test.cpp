@@ -9,7 +9,6 @@
 using namespace std::string_literals;
 
 TEST(SequencerMessage, CarriesItsTextIn16BitCharactersWithoutATerminator) {
-    EXPECT_EQ(sequencerText(SequencerCommand::Start), "15<SEQVIS>START");
     EXPECT_EQ(sequencerText(SequencerCommand::Stop), "15<SEQVIS>STOP");
     EXPECT_EQ(sequencerRecord("AB"), "\3\0\0\0\4\0\0\0A\0B\0"s);
     for (const auto& [number, code] : {std::pair{1, "01"}, {10, "10"}, {0, "00"}, {100, "00"}})
