@@ -1,4 +1,5 @@
 #include "engine/blend.h"
+#include "tests/support/masks.h"
 #include "util/random_source.h"
 
 #include <cmath>
@@ -7,29 +8,6 @@ namespace {
 
 constexpr std::int32_t kWidth = 160;
 constexpr std::int32_t kHeight = 140;
-
-BulbMask randomMask(std::int32_t size, bool soft, SeededRandom& random) {
-    BulbMask mask;
-    mask.Size = size;
-    mask.Soft = soft;
-    const std::int32_t side = 2 * size;
-    mask.Stride = !soft && size <= 2 ? 4 : (side + 7) / 8 * 8;
-    mask.Coverage.resize(static_cast<std::size_t>(side * side));
-    if (!soft) mask.Lanes.assign(static_cast<std::size_t>(side * mask.Stride), 0);
-    for (std::int32_t y = 0; y < side; ++y) {
-        mask.Blocks.push_back({0, static_cast<std::uint8_t>((side + 7) / 8)});
-        for (std::int32_t x = 0; x < side; ++x) {
-            // Soft rows mirror each other, as those of floods do.
-            const auto mirror = static_cast<std::size_t>((side - 1 - y) * side + x);
-            std::uint8_t& coverage = mask.Coverage[static_cast<std::size_t>(y * side + x)];
-            coverage = static_cast<std::uint8_t>(soft ? ZephReturnRandomNumber(0, 255, random)
-                                                      : 255 * ZephReturnRandomNumber(0, 1, random));
-            if (soft && y >= size) coverage = mask.Coverage[mirror];
-            if (!soft && coverage != 0) mask.Lanes[static_cast<std::size_t>(y * mask.Stride + x)] = 0xFFFFFFFFU;
-        }
-    }
-    return mask;
-}
 
 }  // namespace
 
@@ -55,9 +33,15 @@ TEST(BlendPixel, RoundsTheExactResultOnce) {
 
 TEST(BlendKernels, AllFormsGiveThePixelsOfTheReference) {
     SeededRandom random(11);
+    ZephDimmingCurve anyCurve{};  // floods of any coverage
+    for (std::uint8_t& level : anyCurve)
+        level = static_cast<std::uint8_t>(ZephReturnRandomNumber(0, 255, random));
+    const auto noisy = makeMasks(anyCurve);
     for (std::int32_t round = 0; round < 600; ++round) {
-        const bool soft = round % 3 == 0;
-        const BulbMask mask = randomMask(ZephReturnRandomNumber(1, soft ? 64 : 16, random), soft, random);
+        const std::int32_t shape = ZephReturnRandomNumber(1, kBulbShapes, random);
+        const BulbMask& mask = round % 3 == 0
+                                   ? noisy->ZephFloodMasks[ZephReturnRandomNumber(1, kMaxFloodSize, random)]
+                                   : noisy->ZephBulbMasks[ZephReturnRandomNumber(1, kMaxBulbSize, random)][shape];
         BulbImage image;
         makeBulbImage(&mask, ZephReturnRandomNumber(0, kWhite, random), image);
         const BulbSprite sprite = spriteOf(image);
@@ -65,13 +49,10 @@ TEST(BlendKernels, AllFormsGiveThePixelsOfTheReference) {
         const auto alpha = static_cast<std::uint8_t>(kind == 1   ? 255
                                                      : kind == 2 ? ZephReturnRandomNumber(1, 3, random)
                                                                  : ZephReturnRandomNumber(0, 255, random));
-        std::vector<BulbItem> items;
-        for (int n = 0; n < 3; ++n) {
-            items.push_back({{static_cast<std::int16_t>(ZephReturnRandomNumber(0, kWidth - 134, random)),
-                              static_cast<std::int16_t>(ZephReturnRandomNumber(-20, kHeight - 1, random))},
-                             0,
-                             0});
-        }
+        std::vector<BulbItem> items(3);
+        for (BulbItem& item : items)
+            item.Place = {static_cast<std::int16_t>(ZephReturnRandomNumber(0, kWidth - 134, random)),
+                          static_cast<std::int16_t>(ZephReturnRandomNumber(-20, kHeight - 1, random))};
         std::vector<std::uint32_t> before(kWidth * kHeight);
         for (std::uint32_t& pixel : before)
             pixel = 0xFF000000U | static_cast<unsigned>(ZephReturnRandomNumber(0, kWhite, random));
@@ -83,9 +64,9 @@ TEST(BlendKernels, AllFormsGiveThePixelsOfTheReference) {
             return pixels;
         };
         const std::vector<std::uint32_t> expected = blended(BlendForm::Reference);
-        ASSERT_EQ(blended(BlendForm::Portable), expected) << "size " << mask.Size << " soft " << soft;
+        ASSERT_EQ(blended(BlendForm::Portable), expected) << "size " << mask.Size << " soft " << mask.Soft;
         if (blendFormAvailable(BlendForm::Avx2)) {
-            ASSERT_EQ(blended(BlendForm::Avx2), expected) << "size " << mask.Size << " soft " << soft;
+            ASSERT_EQ(blended(BlendForm::Avx2), expected) << "size " << mask.Size << " soft " << mask.Soft;
         }
     }
 }

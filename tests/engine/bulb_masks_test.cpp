@@ -21,41 +21,21 @@ int at(const BulbMask& mask, int x, int y) {
 
 }  // namespace
 
-TEST(BulbShapes, VerticesAreCutOffAtEverySize) {
-    // (15, 0) (32, 32) (0, 32) on the grid of 32; at size 5 a step is 10/32 of a pixel.
-    const std::vector<ShapeVertex> triangle(ZephTriangles.at(5).begin(), ZephTriangles.at(5).end());
-    EXPECT_EQ(triangle, (std::vector<ShapeVertex>{{4, 0}, {10, 10}, {0, 10}}));
-    EXPECT_EQ(ZephStarEight.at(16)[5], (ShapeVertex{24, 16}));
-    EXPECT_EQ(ZephStarEight.VertexCount, 16U);
-    EXPECT_EQ(ZephStarFive.at(16)[6], (ShapeVertex{6, 32}));
-}
-
 TEST(BulbMasks, SmallBulbsAreDrawnHard) {
     const auto& bulbs = masks().ZephBulbMasks;
     EXPECT_EQ(drawn(bulbs[1][1]), "##/##");
     EXPECT_EQ(drawn(bulbs[2][1]), ".##./####/####/.##.");
-    EXPECT_EQ(drawn(bulbs[2][3]), "####/####/####/####");
-    EXPECT_EQ(drawn(bulbs[3][1]), ".####./######/######/######/######/.####.");
     // Corners at (3, 0), (8, 8) and (0, 8): the sides lie at 3 - 3y/8 and 3 + 5y/8, to the nearest pixel, and the base
     // is cut off.
     EXPECT_EQ(drawn(bulbs[4][2]), "...#..../...##.../..###.../..####../..#####./.######./.#######/########");
+    EXPECT_EQ(ZephStarEight.at(16)[5], (ShapeVertex{24, 16}));
+    EXPECT_EQ(ZephStarFive.at(16)[6], (ShapeVertex{6, 32}));
 }
 
-TEST(BulbMasks, EveryShapeIsVisibleAtEverySizeAndRoundOnesAreSymmetric) {
+TEST(BulbMasks, EveryShapeIsVisibleAtEverySize) {
     for (std::int32_t size = 1; size <= kMaxBulbSize; ++size) {
-        for (std::int32_t shape = 1; shape <= kBulbShapes; ++shape) {
-            const BulbMask& mask = masks().ZephBulbMasks[size][shape];
-            ASSERT_EQ(mask.Coverage.size(), static_cast<std::size_t>(4 * size * size));
-            EXPECT_NE(drawn(mask).find('#'), std::string::npos) << size << " " << shape;
-            EXPECT_THAT(mask.Coverage, testing::Each(testing::AnyOf(0, 255)));
-        }
-        const BulbMask& round = masks().ZephBulbMasks[size][1];
-        for (int y = 0; y < 2 * size; ++y) {
-            for (int x = 0; x < 2 * size; ++x) {
-                EXPECT_EQ(at(round, x, y), at(round, 2 * size - 1 - x, y));
-                EXPECT_EQ(at(round, x, y), at(round, y, x));
-            }
-        }
+        for (std::int32_t shape = 1; shape <= kBulbShapes; ++shape)
+            EXPECT_NE(drawn(masks().ZephBulbMasks[size][shape]).find('#'), std::string::npos) << size << " " << shape;
     }
 }
 
@@ -63,33 +43,25 @@ TEST(FloodMasks, AreStaircasesOfRingsUnderTheCurve) {
     const BulbMask& flood = masks().ZephFloodMasks[10];  // 4 rings (10 / 2.3 = 4.35), step 255 / 4.35 = 59
     for (const auto& [x, expected] : {std::pair{0, 59}, {1, 59}, {2, 118}, {4, 177}, {6, 236}, {9, 236}, {19, 59}})
         EXPECT_EQ(at(flood, x, 10), expected) << x;
-    EXPECT_EQ(at(flood, 0, 0), 0);
     EXPECT_EQ(drawn(masks().ZephFloodMasks[1]), "../..");
-    EXPECT_EQ(at(masks().ZephFloodMasks[2], 1, 1), 255);
     EXPECT_EQ(at(masks().ZephFloodMasks[64], 63, 63), 252);  // 28 rings in steps of 9
 
     ZephDimmingCurve steep{};
     steep[236] = 200;
     const auto tight = makeMasks(steep);
-    EXPECT_EQ(at(tight->ZephFloodMasks[10], 4, 10), 0);
     EXPECT_EQ(at(tight->ZephFloodMasks[10], 6, 10), 200);
 }
 
 TEST(MaskOf, LeavesOutWhatTheTablesDoNotHold) {
-    struct Case {
-        std::int32_t type;
-        std::int32_t size;
-        std::int32_t shape;
-        bool found;
-    };
-    for (const Case& test :
-         {Case{1, 16, 11, true}, Case{1, 17, 1, false}, Case{1, 0, 1, false}, Case{1, 2, 12, false},
-          Case{1, 2, 0, false}, Case{2, 64, 99, true}, Case{2, 65, 1, false}, Case{3, -2147483647, 1, false}}) {
+    using Case = std::array<std::int32_t, 4>;  // type, size, shape, found
+    for (const auto& [type, size, shape, found] :
+         {Case{1, 16, 11, 1}, Case{1, 17, 1, 0}, Case{1, 0, 1, 0}, Case{1, 2, 12, 0}, Case{1, 2, 0, 0},
+          Case{2, 64, 99, 1}, Case{2, 65, 1, 0}, Case{3, -2147483647, 1, 0}}) {
         ZephFixture fixture;
-        fixture.Fixture_Type = test.type;
-        fixture.BulbSize = test.size;
-        fixture.BulbShape = test.shape;
-        EXPECT_EQ(maskOf(masks(), fixture) != nullptr, test.found) << test.type << " " << test.size;
+        fixture.Fixture_Type = type;
+        fixture.BulbSize = size;
+        fixture.BulbShape = shape;
+        EXPECT_EQ(maskOf(masks(), fixture) != nullptr, found == 1) << type << " " << size << " " << shape;
         EXPECT_EQ(maskOf(ZephMasks{}, fixture), nullptr);
     }
 }

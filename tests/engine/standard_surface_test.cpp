@@ -3,21 +3,20 @@
 #include "tests/support/recording_host.h"
 #include "tests/support/reference_surface.h"
 
+#include <QPainter>
+
 #include <algorithm>
 
 namespace {
 
 // Pixels that differ from what was there before must lie within the rectangles told.
 bool changesAreTold(const QImage& before, const StandardSurface& surface) {
-    const QImage& after = surface.image();
-    for (int y = 0; y < after.height(); ++y) {
-        for (int x = 0; x < after.width(); ++x) {
-            if (before.pixel(x, y) == after.pixel(x, y)) continue;
-            const auto holds = [&](const QRect& rect) { return rect.contains(x, y); };
-            if (std::none_of(surface.changedRects().begin(), surface.changedRects().end(), holds)) return false;
-        }
-    }
-    return true;
+    QImage told = before;
+    QPainter painter(&told);
+    for (const QRect& rect : surface.changedRects())
+        painter.drawImage(rect.topLeft(), surface.image(), rect);
+    painter.end();
+    return told == surface.image();
 }
 
 void comparePictures(std::uint64_t seed, const BlendKernels& kernels) {
@@ -57,29 +56,26 @@ TEST(StandardSurface, ShowsTheSamePixelsAsTheReference) {
         comparePictures(seed, seed <= 120 ? fastestBlendKernels() : blendKernels(BlendForm::Portable));
 }
 
-TEST(StandardSurface, TellsNothingWhileThePictureStaysAndOnlyTheBulbThatMoved) {
+TEST(StandardSurface, TellsNothingWhileThePictureStays) {
     Stage stage;
     stage.blank(400, 300, qRgb(16, 32, 48));
-    stage.addLit(kFixtureBulbs, 2, 1, {{20, 100}}, packColor(255, 0, 0));
     stage.addLit(kFixtureBulbs, 2, 1, {{300, 100}}, packColor(255, 0, 0));
     stage.finish();
     CollectingFailures report;
     StandardSurface surface;
     ASSERT_TRUE(surface.prepare(stage.scene(stage.tables), report));
-    const auto frame = [&](std::uint8_t first, std::uint8_t second) {
+    const auto frame = [&](std::uint8_t alpha) {
         surface.beginFrame();
-        surface.drawChannel({1, 1, 1, 0, first});
-        surface.drawChannel({1, 2, 1, 0, second});
+        surface.drawChannel({1, 1, 1, 0, alpha});
         surface.endFrame();
         return std::vector<QRect>(surface.changedRects().begin(), surface.changedRects().end());
     };
-    EXPECT_EQ(frame(0, 0), std::vector<QRect>{QRect(0, 0, 400, 300)});  // the picture is new
-    EXPECT_EQ(frame(0, 0).size(), 0U);
-    EXPECT_GT(frame(255, 128).size(), 0U);
-    EXPECT_EQ(frame(255, 128).size(), 0U);
-    EXPECT_EQ(surface.image().pixel(20, 100), 0xFFFF0000U);
+    EXPECT_EQ(frame(0), std::vector<QRect>{QRect(0, 0, 400, 300)});  // the picture is new
+    EXPECT_EQ(frame(0).size(), 0U);
+    EXPECT_EQ(frame(128).size(), 1U);
+    EXPECT_EQ(frame(128).size(), 0U);
     EXPECT_EQ(surface.image().pixel(300, 100), 0xFF881018U);  // (16 x 127 + 255 x 128) / 255 = 135.97, 15.9, 23.9
-    frame(0, 0);
+    frame(0);
     EXPECT_EQ(surface.image(), stage.background);
 }
 

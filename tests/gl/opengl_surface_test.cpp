@@ -17,7 +17,6 @@ struct GLRig {
     explicit GLRig(const Stage& stage) : target(stage.background.width(), stage.background.height()) {
         start(stage, stage.background);
     }
-    GLRig(const Stage& stage, int width, int height) : target(width, height) { start(stage, stage.background); }
     void start(const Stage& stage, const QImage& picture, std::int32_t intensity = 100) {
         EXPECT_TRUE(surface.ZephGLStartup({*stage.simulation, stage.tables, *stage.states, curve, masks().GLShapes,
                                            picture, intensity, stage.background.width(), stage.background.height()},
@@ -51,18 +50,17 @@ Call lit(std::uint8_t alpha) {
     return call;
 }
 
-enum class Opacity { Full, Quarter };
-
-// Full: lights are on or off, and nothing is left to rounding. Quarter: no light covers less than that, or the
-// fractions that the standard surface cuts off would add up under dozens of layers.
-void setOpacity(Opacity opacity, std::vector<Call>& calls) {
+// Full: lights are on or off, and nothing is left to rounding. Otherwise none covers less than a quarter, or the
+// fractions that the standard surface cuts off would add up under dozens of layers: one level a layer, of which three
+// quarters at most live through the next one, are four in all, and one for rounding.
+void setOpacity(bool full, std::vector<Call>& calls) {
     for (Call& call : calls) {
         std::uint8_t& alpha = call.channel ? call.channel->Alpha : call.group->Alpha;
-        alpha = opacity == Opacity::Full ? (alpha < 128 ? 0 : 255) : std::max<std::uint8_t>(alpha, 64);
+        alpha = full ? (alpha < 128 ? 0 : 255) : std::max<std::uint8_t>(alpha, 64);
     }
 }
 
-void compareSquares(std::uint64_t seed, Opacity opacity, int tolerance) {
+void compareSquares(std::uint64_t seed, bool full) {
     RandomStage stage(seed, false);
     ZephRenderTables standardTables = stage.tables;
     CollectingFailures failures;
@@ -79,18 +77,17 @@ void compareSquares(std::uint64_t seed, Opacity opacity, int tolerance) {
         for (std::size_t i = calls.size(); kind == 5 && i > 1; --i)
             std::swap(calls[i - 1], calls[static_cast<std::size_t>(stage.pick(0, static_cast<int>(i) - 1))]);
         if (kind == 3) calls.insert(calls.end(), calls.begin(), calls.begin() + std::ssize(calls) / 2);
-        setOpacity(opacity, calls);
+        setOpacity(full, calls);
         // The standard surface keeps an image while colours drift a little; here each is to be made anew.
         for (ZephRGBData& group : standardTables.RGBData)
             group.LastLevel[1] = -kRGBRebuildDrift;
         play(calls, standardTables, standard);
         const QImage drawn = gl.frame(calls, stage.tables);
         ASSERT_EQ(drawn.size(), standard.image().size());
-        for (int y = 0; y < drawn.height(); ++y) {
-            for (int x = 0; x < drawn.width(); ++x) {
-                ASSERT_LE(farthest(drawn.pixel(x, y), standard.image().pixel(x, y)), tolerance)
-                    << "seed " << seed << " frame " << n << " kind " << kind << " at " << x << "," << y;
-            }
+        for (int place = 0; place < drawn.width() * drawn.height(); ++place) {
+            const QPoint at(place % drawn.width(), place / drawn.width());
+            ASSERT_LE(farthest(drawn.pixel(at), standard.image().pixel(at)), full ? 0 : 5)
+                << "seed " << seed << " frame " << n << " kind " << kind << " at " << at.x() << "," << at.y();
         }
     }
 }
@@ -99,18 +96,17 @@ void compareSquares(std::uint64_t seed, Opacity opacity, int tolerance) {
 
 // Squares cover the same pixels in both, so every pixel tells of position, colour, order and opacity.
 TEST(OpenGLSurface, ShowsTheSamePixelsAsTheStandardSurface) {
-    // One level a layer is cut off, of which three quarters at most live through the next layer: four in all, and one
-    // for rounding.
     for (std::uint64_t seed = 1; seed <= 120 && !HasFatalFailure(); ++seed)
-        compareSquares(seed, seed <= 60 ? Opacity::Full : Opacity::Quarter, seed <= 60 ? 0 : 5);
+        compareSquares(seed, seed <= 60);
 }
 
-// The two cut shapes out of pixels by different rules; they may differ along the outline, by no more than one pixel.
-TEST(OpenGLSurface, FillsTheShapesOfTheMasks) {
+// The two cut shapes out of pixels by different rules; they may differ along the outline, by no more than one pixel. At
+// half strength, triangles that overlap would show.
+TEST(OpenGLSurface, FillsTheShapesOfTheMasksOnce) {
     for (std::int32_t shape = 1; shape <= kBulbShapes; ++shape) {
         for (std::int32_t size = 1; size <= kMaxBulbSize; ++size) {
             const DarkStage stage(60, 60, size, shape, {{30, 30}});
-            const QImage drawn = GLRig(stage).frame({lit(255)}, stage.tables);
+            const QImage drawn = GLRig(stage).frame({lit(128)}, stage.tables);
             const BulbMask& mask = masks().ZephBulbMasks[size][shape];
             const auto covered = [&](int x, int y) {
                 const int column = x - (30 - size);
@@ -124,10 +120,10 @@ TEST(OpenGLSurface, FillsTheShapesOfTheMasks) {
                 int around = 0;
                 for (int next = 0; next < 9; ++next)
                     around += covered(x + next % 3 - 1, y + next / 3 - 1) ? 1 : 0;
-                const bool white = qRed(drawn.pixel(x, y)) > 127;
+                const int red = qRed(drawn.pixel(x, y));
                 // Arms of the smallest stars are thinner than a pixel.
-                const bool wrong = (around == 9 && size > 2 && !white) || (around == 0 && white);
-                ASSERT_FALSE(wrong) << shape << " of " << size << " at " << x << "," << y;
+                const bool wrong = (around == 9 && size > 2 && red == 0) || (around == 0 && red > 0);
+                ASSERT_FALSE(wrong || red > 129) << shape << " of " << size << " at " << x << "," << y;
             }
         }
     }
@@ -142,7 +138,6 @@ TEST(OpenGLSurface, DrawsFloodsAsDiscsUpToTheirOpacity) {
     GLRig gl(stage);
     const auto at = [&](std::uint8_t alpha, int x, int y) { return gl.frame({lit(alpha)}, stage.tables).pixel(x, y); };
     // 51 lies above 50 and so becomes 50 per cent, 127 of 255; 50 does not.
-    EXPECT_LE(farthest(at(255, 70, 70), qRgb(100, 50, 0)), 1);
     EXPECT_LE(farthest(at(51, 70, 70), qRgb(100, 50, 0)), 1);
     EXPECT_LE(farthest(at(50, 70, 70), qRgb(39, 20, 0)), 1);
     // As bright at the rim as in the middle, and nothing in the corner of its box.
@@ -153,38 +148,22 @@ TEST(OpenGLSurface, DrawsFloodsAsDiscsUpToTheirOpacity) {
 }
 
 TEST(OpenGLSurface, LaysThePictureOverBlack) {
-    struct Row {
-        bool picture;
-        std::int32_t intensity;
-        QRgb expected;
-    };
+    using Row = std::tuple<bool, std::int32_t, QRgb>;  // with a picture, intensity, expected
     DarkStage stage(40, 30, 2, 3, {});
     GLRig gl(stage);
     QImage small(4, 3, QImage::Format_RGB32);  // stretched to the drawing
     small.fill(qRgb(200, 100, 40));
-    for (const Row& row :
+    for (const auto& [picture, intensity, expected] :
          {Row{true, 100, qRgb(200, 100, 40)}, Row{true, 50, qRgb(100, 50, 20)}, Row{true, 0, qRgb(0, 0, 0)},
-          Row{false, 100, qRgb(255, 255, 255)}, Row{false, 60, qRgb(153, 153, 153)}, Row{false, 0, qRgb(0, 0, 0)}}) {
-        gl.start(stage, row.picture ? small : QImage(), row.intensity);
+          Row{false, 60, qRgb(153, 153, 153)}}) {
+        gl.start(stage, picture ? small : QImage(), intensity);
         const QImage drawn = gl.frame({}, stage.tables);
         for (const QPoint& place : {QPoint(0, 0), QPoint(39, 0), QPoint(0, 29), QPoint(20, 15)})
-            EXPECT_LE(farthest(drawn.pixel(place), row.expected), 1) << row.picture << " at " << row.intensity;
+            EXPECT_LE(farthest(drawn.pixel(place), expected), 1) << picture << " at " << intensity;
     }
     // The upper left corner of the picture is that of the drawing.
     stage.background.setPixel(1, 2, qRgb(255, 0, 0));
     EXPECT_EQ(GLRig(stage).frame({}, stage.tables), stage.background);
-}
-
-// A wider window shows more room to the right and below, not larger bulbs.
-TEST(OpenGLSurface, KeepsOneUnitOnePixelInAWindowOfAnotherSize) {
-    const DarkStage stage(40, 40, 2, 3, {{10, 10}, {50, 10}});
-    GLRig gl(stage, 60, 40);
-    gl.surface.setViewport(60, 40, 1.0);
-    const QImage drawn = gl.frame({lit(255)}, stage.tables);
-    EXPECT_EQ(drawn.pixel(8, 8), qRgb(255, 255, 255));
-    EXPECT_EQ(drawn.pixel(7, 8), qRgb(0, 0, 0));
-    EXPECT_EQ(drawn.pixel(51, 11), qRgb(255, 255, 255));
-    EXPECT_EQ(drawn.pixel(52, 11), qRgb(0, 0, 0));
 }
 
 TEST(OpenGLSurface, TellsWhyItCannotStart) {
@@ -213,20 +192,4 @@ TEST(OpenGLSurface, TellsWhyItCannotStart) {
     EXPECT_EQ(failures.reports[0].procedure, "Zeph.modZephRenderOPenGL.ZephGLStartup");
     EXPECT_EQ(failures.reports[1].description, "OpenGL lacks glActiveTexture");
     play({lit(255)}, stage.tables, surface);  // draws nothing, and does not crash
-}
-
-TEST(OpenGLSurface, CoversBulbsThatHangOutOfThePictureOnce) {
-    for (const std::int32_t size : {1, 5, 16}) {
-        for (const auto& [x, y] : {Place{20, 1}, {1, 15}, {39, 15}, {20, 29}, {0, 0}, {40, 30}}) {
-            const DarkStage stage(40, 30, size, 3, {{x, y}});
-            const QImage drawn = GLRig(stage).frame({lit(64)}, stage.tables);
-            QImage expected(40, 30, drawn.format());
-            expected.fill(qRgb(0, 0, 0));
-            for (int column = std::max(0, x - size); column < std::min(40, x + size); ++column) {
-                for (int row = std::max(0, y - size); row < std::min(30, y + size); ++row)
-                    expected.setPixel(column, row, qRgb(64, 64, 64));
-            }
-            EXPECT_EQ(drawn, expected) << size << " " << x << "," << y;
-        }
-    }
 }
