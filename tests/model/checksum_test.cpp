@@ -1,5 +1,5 @@
 #include "model/checksum.h"
-#include "tests/support/folder.h"
+#include "tests/support/loading.h"
 #include "util/failure.h"
 
 namespace {
@@ -30,31 +30,20 @@ TEST(Md5, GivesThePublishedValuesInUpperCase) {
 }
 
 TEST(Checksum, HashesUtf16CodeUnitsThenTheSeedOrABlank) {
-    std::string bytes;
-    for (const char16_t unit : u"<a n=\"\u00e4\U0001F384\"/>" + std::u16string(u"20481973"))
-        bytes.append({static_cast<char>(unit & 0xFF), static_cast<char>(unit >> 8)});
     MD5Hash hash;
     const std::string text = "<a n=\"\xC3\xA4\xF0\x9F\x8E\x84\" Chksum=\"X\"/>";
+    const std::u16string units = u"<a n=\"\u00e4\U0001F384\"/>";
     const auto attribute = findChecksumAttribute(text, 1);
     ASSERT_TRUE(attribute);
-    EXPECT_EQ(editorChecksum(text, *attribute, false), hash.HashBytes(bytes));
-    bytes.resize(bytes.size() - 16);
-    bytes.append(" \0", 2);
-    EXPECT_EQ(editorChecksum(text, *attribute, true), hash.HashBytes(bytes));
-}
+    EXPECT_EQ(editorChecksum(text, *attribute, false), hash.HashBytes(utf16Bytes(units + u"20481973")));
+    EXPECT_EQ(editorChecksum(text, *attribute, true), hash.HashBytes(utf16Bytes(units + u" ")));
 
-TEST(Checksum, ACharacterMayLieAcrossTheBlocks) {
     // Three bytes a character: no block of a power of two ends between two of them, so every border cuts one.
-    std::string text;
-    while (text.size() < 200'000)
-        text += "\xE2\x82\xAC";
-    std::string units;
-    for (std::size_t n = 0; n < text.size() / 3; ++n)
-        units.append("\xAC\x20", 2);
-    for (const char digit : std::to_string(kChecksumSeed))
-        units.append({digit, '\0'});
-    MD5Hash hash;
-    EXPECT_EQ(editorChecksum(text, {0, 0}, false), hash.HashBytes(units));
+    std::string signs;
+    for (int n = 0; n < 70'000; ++n)
+        signs += "\xE2\x82\xAC";
+    const std::u16string signUnits(70'000, u'\u20AC');
+    EXPECT_EQ(editorChecksum(signs, {0, 0}, false), hash.HashBytes(utf16Bytes(signUnits + u"20481973")));
 }
 
 TEST(Checksum, TheAttributeIsFoundInAnySpelling) {

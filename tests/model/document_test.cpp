@@ -1,5 +1,4 @@
 #include "model/channel_identity.h"
-#include "model/data_directories.h"
 #include "model/document.h"
 #include "model/tables.h"
 #include "tests/support/fixtures.h"
@@ -42,22 +41,18 @@ TEST(Props, AFixtureAddedToAFullPropPointsAtItButIsNotListed) {
     EXPECT_TRUE(ZephAddFixtureToProp(64, 1, *display.simulation)) << "a second time changes nothing";
     EXPECT_FALSE(ZephAddFixtureToProp(65, 1, *display.simulation));
     EXPECT_EQ(display.members(1).size(), 64u);
-    EXPECT_EQ(display.simulation->Fixtures[65].AssignedItem, 1);
-    EXPECT_EQ(display.simulation->Fixtures[65].AssignedItemName, "P1");
-}
+    const ZephFixture& surplus = display.simulation->Fixtures[65];
+    EXPECT_EQ(surplus.AssignedItem, 1);
+    EXPECT_EQ(surplus.AssignedItemName, "P1");
 
-TEST(Props, AMissMarksTheDocumentDirtyAndKeepsTheAssignment) {
-    Display display(2, 1);
-    ZephAddFixtureToProp(1, 1, *display.simulation);
-    display.simulation->Fixtures[2].AssignedItem = 1;
     display.simulation->SimulationDirty = false;
-    EXPECT_FALSE(ZephDeleteFixtureFromProp(2, 1, *display.simulation));
-    EXPECT_TRUE(display.simulation->SimulationDirty);
-    EXPECT_EQ(display.simulation->Fixtures[2].AssignedItem, 1);
-    EXPECT_FALSE(ZephDisassociateFromProp(2, 1, *display.simulation));
-    EXPECT_EQ(display.simulation->Fixtures[2].AssignedItem, 0);
-    EXPECT_TRUE(ZephDeleteFixtureFromProp(1, 1, *display.simulation));
-    EXPECT_THAT(display.members(1), ElementsAre());
+    EXPECT_FALSE(ZephDeleteFixtureFromProp(65, 1, *display.simulation));
+    EXPECT_TRUE(display.simulation->SimulationDirty) << "even by a miss";
+    EXPECT_EQ(surplus.AssignedItem, 1);
+    EXPECT_FALSE(ZephDisassociateFromProp(65, 1, *display.simulation));
+    EXPECT_EQ(surplus.AssignedItem, 0);
+    EXPECT_TRUE(ZephDeleteFixtureFromProp(64, 1, *display.simulation));
+    EXPECT_EQ(display.members(1).size(), 63u);
 }
 
 TEST(Deleting, AFixtureRenumbersEveryMemberAboveIt) {
@@ -70,6 +65,12 @@ TEST(Deleting, AFixtureRenumbersEveryMemberAboveIt) {
     EXPECT_EQ(display.simulation->Fixtures[5].AssignedItem, 2);
     EXPECT_EQ(display.simulation->Fixtures[10].Name, "") << "the freed record is cleared";
     EXPECT_THAT(display.watcher.removed, ElementsAre(5));
+
+    display.watcher.lists = 0;
+    EXPECT_TRUE(ZephDeleteFixturesByProp(4, *display.simulation, display.watcher));
+    EXPECT_EQ(display.names(), "F1 F2 F3 F7 F8 F9");
+    EXPECT_EQ(display.simulation->PropCount, 2);
+    EXPECT_EQ(display.watcher.lists, 1) << "once for all of them";
 }
 
 TEST(Deleting, APropMovesTheLaterOnesDownAndFreesItsMembers) {
@@ -82,38 +83,6 @@ TEST(Deleting, APropMovesTheLaterOnesDownAndFreesItsMembers) {
     for (const auto& [fixture, prop] : {std::pair{1, 1}, {2, 0}, {3, 2}})
         EXPECT_EQ(display.simulation->Fixtures[fixture].AssignedItem, prop);
     EXPECT_EQ(display.simulation->Fixtures[3].AssignedItemName, "P3");
-}
-
-TEST(Deleting, ByPropEmptiesThePropAndRebuildsTheListOnce) {
-    Display display(5, 1);
-    for (const int f : {2, 4, 5})
-        ZephAddFixtureToProp(f, 1, *display.simulation);
-    EXPECT_TRUE(ZephDeleteFixturesByProp(4, *display.simulation, display.watcher));
-    EXPECT_EQ(display.names(), "F1 F3");
-    EXPECT_EQ(display.simulation->PropCount, 1);
-    EXPECT_EQ(display.watcher.lists, 1);
-}
-
-TEST(Reset, KeepsTheEditStateOnRequest) {
-    Display display(3, 1);
-    display.simulation->SimulationOpen = true;
-    display.simulation->Dimmed = 50;
-    ZephGlobalReset(true, *display.simulation, display.watcher);
-    EXPECT_TRUE(display.simulation->SimulationOpen);
-    EXPECT_EQ(display.watcher.selections + display.watcher.clipboards, 0);
-    EXPECT_EQ(display.simulation->Fixtures[1], ZephFixture{});
-    EXPECT_EQ(display.simulation->Levels[1].Name, "Level 1");
-    EXPECT_EQ(display.simulation->Dimmed + display.simulation->FixtureCount, 0);
-    ZephGlobalReset(false, *display.simulation, display.watcher);
-    EXPECT_FALSE(display.simulation->SimulationOpen);
-    EXPECT_EQ(display.watcher.clipboards, 1);
-}
-
-TEST(NewFixtureName, IsTheFirstFreeOneByExactCase) {
-    Display display(3, 0);
-    display.simulation->Fixtures[1].Name = "New Fixture 1";
-    display.simulation->Fixtures[2].Name = "new fixture 2";
-    EXPECT_EQ(ZephReturnNewFixtureName(*display.simulation), "New Fixture 2");
 }
 
 TEST(FixturesPerChannel, WarnsAtSixteenInTheGivenWords) {
@@ -142,29 +111,21 @@ TEST(FixturesPerChannel, WarnsAtSixteenInTheGivenWords) {
     EXPECT_EQ(host.boxes.size(), 1u);
 }
 
-TEST(Identity, X10AddressesReadAsHouseAndUnit) {
+TEST(Tables, NumbersReadAsTheirNames) {
     EXPECT_EQ(ZephReturnX10HouseCode(0) + ZephReturnX10UnitCode(0), "A1");
     EXPECT_EQ(ZephReturnX10HouseCode(255) + ZephReturnX10UnitCode(255), "P16");
+    EXPECT_EQ(networkName(15), "Aux O");
+    EXPECT_EQ(universeName(999), "Unv 999");
+    Display display(3, 0);
+    display.simulation->Fixtures[1].Name = "New Fixture 1";
+    display.simulation->Fixtures[2].Name = "new fixture 2";
+    EXPECT_EQ(ZephReturnNewFixtureName(*display.simulation), "New Fixture 2") << "the first free one by exact case";
 }
 
 TEST(Tables, RibbonResolutionsKeepTheirUnevenRow) {
     ZephFixture fixture;
     fixture.Kesh.Resolution = 5;
     EXPECT_EQ(KeshResolutionToResolutionCount(3), 17);
-    EXPECT_EQ(KeshResolutionCountToResolution(fixture, 16), 3);
-    EXPECT_EQ(KeshResolutionCountToResolution(fixture, 17), 2);
-    EXPECT_EQ(KeshResolutionCountToResolution(fixture, 3), 5);
-    EXPECT_EQ(KeshResolutionToResolutionCount(8), 50);
-    EXPECT_EQ(networkName(15), "Aux O");
-    EXPECT_EQ(universeName(999), "Unv 999");
-}
-
-TEST(DataDirectories, FollowTheMostRecentFiles) {
-    const ZephPathService paths("/tmp/base");
-    ZephSettings settings;
-    EXPECT_EQ(ZephReturnDataDirectory(1, paths, settings), "/tmp/base/Editor/");
-    EXPECT_EQ(ZephReturnDataDirectory(4, paths, settings), "/tmp/base/Curves/");
-    EXPECT_EQ(ZephReturnDataDirectory(5, paths, settings), "");
-    settings.RecentFiles[0] = "/home/me/house.zee";
-    EXPECT_EQ(ZephReturnDataDirectory(1, paths, settings), "/home/me/");
+    for (const auto& [count, resolution] : {std::pair{16, 3}, {17, 2}, {3, 5}})
+        EXPECT_EQ(KeshResolutionCountToResolution(fixture, count), resolution);
 }

@@ -33,7 +33,6 @@ TEST(Writing, WhatIsWrittenIsReadBackWhole) {
         EXPECT_TRUE(bench.load());
         EXPECT_TRUE(*bench.simulation == *written);
         EXPECT_EQ(bench.host.boxTexts(), "");
-        EXPECT_TRUE(bench.failures.reports.empty());
     }
 }
 
@@ -69,10 +68,4 @@ TEST(Writing, AFailureIsToldOrReportedAndHarmsNothing) {
     ASSERT_EQ(bench.failures.reports.size(), 1u);
     EXPECT_EQ(bench.failures.reports[0].procedure, "Zeph.modZephLoadSave.ZephSaveVisualizerXML");
     EXPECT_EQ(bench.written(), "old");
-}
-
-TEST(Writing, TheTimeOfASaveShowsItsSeconds) {
-    const std::string now = createdAtNow();
-    EXPECT_NE(now.find(' '), std::string::npos);
-    EXPECT_GE(std::ranges::count(now, ':') + std::ranges::count(now, '.'), 2) << now;
 }

@@ -37,8 +37,6 @@ struct UndoBench : LoadBench, UndoFace {
     void again() { EXPECT_TRUE(ZephRedoLastAction(undo, *simulation, stores, restoreProperties)); }
     std::string text() const { return editorText(*simulation, paths, ""); }
     std::string name(int fixture) const { return simulation->Fixtures[fixture].Name; }
-    // What is shown for the newest step.
-    std::string undoText() const { return stores.UndoStore.back().Text; }
 };
 
 // Every third fixture of the example: all kinds, and a text that is soon written.
@@ -129,12 +127,10 @@ TEST(Undo, GivesExactlyWhatWritingAndReadingWouldGive) {
         for (int step = 0; step < kept; ++step)
             bench.again();
         ASSERT_EQ(bench.text(), last);
-        if (bench.simulation->FixtureCount >= 10) continue;
-        openDisplay(bench);
+        if (bench.simulation->FixtureCount < 10) openDisplay(bench);
     }
     EXPECT_GT(undone, 700);
     EXPECT_TRUE(bench.failures.reports.empty());
-    EXPECT_TRUE(bench.host.boxes.empty());
 }
 
 TEST(Undo, SharesWhatDidNotChange) {
@@ -143,17 +139,12 @@ TEST(Undo, SharesWhatDidNotChange) {
     ZephSimulation& document = *bench.simulation;
     const DocumentSnapshot before = takeSnapshot(document, bench.paths, {});
     document.Fixtures[3].DrawPoints[20].Y += 15;
-    const auto shared = [&](const DocumentSnapshot& later) {
-        return std::ranges::count_if(later.Fixtures, [&](const PackedRecord& record) {
-            return std::ranges::find(before.Fixtures, record) != before.Fixtures.end();
-        });
-    };
-    EXPECT_EQ(shared(takeSnapshot(document, bench.paths, before)), 59);
+    document.Fixtures[1].Channels[16].LED ^= true;
     ZephDeleteThisFixture(10, true, document, bench.watcher);
     ZephDeleteThisFixture(30, true, document, bench.watcher);
-    EXPECT_EQ(shared(takeSnapshot(document, bench.paths, before)), 57) << "all but the changed one and the two deleted";
-    document.Fixtures[1].Channels[17 - 1].LED ^= true;
-    EXPECT_EQ(shared(takeSnapshot(document, bench.paths, before)), 56);
+    const DocumentSnapshot after = takeSnapshot(document, bench.paths, before);
+    const auto shared = [&](const PackedRecord& record) { return std::ranges::count(before.Fixtures, record) > 0; };
+    EXPECT_EQ(std::ranges::count_if(after.Fixtures, shared), 56) << "all but the two changed and the two deleted";
 }
 
 TEST(Undo, KeepsTwentyStepsAndRunsBackAndForth) {
@@ -161,26 +152,18 @@ TEST(Undo, KeepsTwentyStepsAndRunsBackAndForth) {
     bench.simulation->FixtureCount = 1;
     for (int n = 1; n <= 21; ++n)
         bench.step(kUndoChanged, 1, std::to_string(n));
-    EXPECT_EQ(bench.stores.UndoPosition, 20);
     bench.simulation->SimulationDirty = false;
     bench.simulation->FileUpgraded = bench.simulation->ChecksumMismatch = true;
-    for (int n = 20; n >= 1; --n) {
+    for (int n = 1; n <= 21; ++n)
         bench.takeBack();
-        EXPECT_EQ(bench.name(1), std::to_string(n));
-    }
+    EXPECT_EQ(bench.name(1), "1") << "the last found nothing to take back";
+    EXPECT_EQ(bench.replaced, 20);
     EXPECT_FALSE(bench.restoreProperties);
     EXPECT_FALSE(bench.simulation->SimulationDirty);
     EXPECT_FALSE(bench.simulation->FileUpgraded || bench.simulation->ChecksumMismatch) << "each load clears both";
-    EXPECT_EQ(bench.replaced, 20);
     EXPECT_EQ(bench.watcher.clipboards, 0);
-    bench.takeBack();
-    EXPECT_EQ(bench.name(1), "1") << "nothing is left to take back";
-    EXPECT_EQ(bench.stores.RedoPosition, 20);
-    for (int n = 2; n <= 21; ++n) {
+    for (int n = 1; n <= 21; ++n)
         bench.again();
-        EXPECT_EQ(bench.name(1), std::to_string(n));
-    }
-    bench.again();
     EXPECT_EQ(bench.name(1), "21");
     bench.takeBack();
     bench.step(kUndoChanged, 1, "new");
@@ -228,10 +211,8 @@ TEST(Undo, DescribesEachActionAndReturnsToItsState) {
         bench.ZephUIState = row.state;
         EXPECT_EQ(bench.add(row.action, row.object, "8 bundles"), row.kept);
         const ZephUndoEntry& entry = bench.stores.UndoStore.back();
-        EXPECT_EQ(entry.Action, row.kept);
         EXPECT_EQ(entry.Text, row.text);
         EXPECT_EQ(entry.EditorMode, row.mode);
-        EXPECT_EQ(entry.ObjectIndex, row.object);
     }
     ZephCommitUndo(bench.stores);
     bench.ZephUIState = kStateSelectFixture;
@@ -241,25 +222,22 @@ TEST(Undo, DescribesEachActionAndReturnsToItsState) {
 
 TEST(Undo, ARunOfLevelStepsIsOneStep) {
     UndoBench bench;
-    bench.simulation->FixtureCount = 2;
-    for (int press = 1; press <= 5; ++press)
-        bench.step(kUndoMovedForward, 1 + press % 2, std::to_string(press));
-    EXPECT_EQ(bench.stores.UndoPosition, 1);
-    bench.step(kUndoMovedBackward, 1, "back");
-    bench.step(kUndoMovedForward, 1, "forth");
-    EXPECT_EQ(bench.stores.UndoPosition, 3);
-    bench.step(kUndoChanged, 1, "a");
-    bench.step(kUndoChanged, 1, "b");
-    EXPECT_EQ(bench.stores.UndoPosition, 5) << "other changes each count";
+    for (const auto& [action, steps] : {std::pair{kUndoMovedForward, 1},
+                                        {kUndoMovedForward, 1},
+                                        {kUndoMovedBackward, 2},
+                                        {kUndoMovedForward, 3},
+                                        {kUndoChanged, 4},
+                                        {kUndoChanged, 5}}) {
+        bench.step(action, 1 + steps % 2, "changed");
+        EXPECT_EQ(bench.stores.UndoPosition, steps);
+    }
 }
 
 TEST(Undo, ARollbackLeavesNoStepAndNothingToRedo) {
     UndoBench bench;
-    bench.simulation->FixtureCount = 1;
     bench.step(kUndoChanged, 1, "a");
     bench.takeBack();
     ZephStartUndoTransaction(bench.stores);
-    bench.add(kUndoChanged);
     bench.add(kUndoChanged);
     ZephRollbackUndo(bench.stores);
     EXPECT_EQ(bench.stores.UndoPosition, 0);
@@ -269,6 +247,13 @@ TEST(Undo, ARollbackLeavesNoStepAndNothingToRedo) {
     bench.add(kUndoChanged);
     bench.step(kUndoCreatedProp, 1, "b");
     EXPECT_EQ(bench.stores.UndoPosition, 1);
+
+    bench.simulation->FixtureCount = kMaxFixtures + 1;  // no document has this
+    std::int32_t action = kUndoChanged;
+    EXPECT_FALSE(ZephAddUndoDataXML(action, 1, "", false, bench.undo, *bench.simulation, bench.stores));
+    EXPECT_EQ(bench.failures.reports.at(0).procedure, "Zeph.modZephUndo.ZephAddUndoDataXML");
+    ZephCommitUndo(bench.stores);
+    EXPECT_EQ(bench.stores.UndoPosition, 1) << "what cannot be kept is no step";
 }
 
 TEST(Undo, RedoOutlivesALoadAndNamesNothing) {
@@ -279,26 +264,14 @@ TEST(Undo, RedoOutlivesALoadAndNamesNothing) {
     EXPECT_EQ(ZephUndoCaptions(bench.stores).redoItem, "Redo Deleted ");
     ZephGlobalReset(false, *bench.simulation, bench.watcher);
     bench.stores.UndoPosition = 0;  // as the window's watcher does
-    bench.simulation->Fixtures[1].Name = "another";
     bench.again();
     EXPECT_EQ(bench.name(1), "old");
     EXPECT_EQ(bench.stores.UndoPosition, 1);
-    EXPECT_EQ(bench.undoText(), "Deleted ");
-    bench.simulation->Fixtures[1].Name = "named";
+    EXPECT_EQ(ZephUndoCaptions(bench.stores).undoItem, "Undo Deleted ");
     bench.step(kUndoDeletedFixture, 1, "new");
     const UndoCaptions captions = ZephUndoCaptions(bench.stores);
-    EXPECT_EQ(captions.undoItem, "Undo Deleted named");
-    EXPECT_EQ(captions.undoTip, "Undo: Deleted named");
+    EXPECT_EQ(captions.undoItem, "Undo Deleted old");
+    EXPECT_EQ(captions.undoTip, "Undo: Deleted old");
     EXPECT_EQ(captions.redoItem, "Redo");
     EXPECT_EQ(captions.redoTip, "Redo");
-}
-
-TEST(Undo, AStepThatCannotBeKeptIsReportedAndMakesNoEntry) {
-    UndoBench bench;
-    bench.simulation->FixtureCount = kMaxFixtures + 1;  // no document has this
-    std::int32_t action = kUndoChanged;
-    EXPECT_FALSE(ZephAddUndoDataXML(action, 1, "", false, bench.undo, *bench.simulation, bench.stores));
-    EXPECT_EQ(bench.failures.reports.at(0).procedure, "Zeph.modZephUndo.ZephAddUndoDataXML");
-    ZephCommitUndo(bench.stores);
-    EXPECT_EQ(bench.stores.UndoPosition, 0);
 }

@@ -25,6 +25,14 @@ public:
     int clipboards = 0;
 };
 
+// The bytes of each code unit, the low one first.
+inline std::string utf16Bytes(std::u16string_view units) {
+    std::string bytes;
+    for (const char16_t unit : units)
+        bytes.append({static_cast<char>(unit & 0xFF), static_cast<char>(unit >> 8)});
+    return bytes;
+}
+
 // One document with its surroundings, in a folder that goes when it goes.
 struct LoadBench {
     Folder folder;
