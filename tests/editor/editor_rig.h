@@ -3,6 +3,7 @@
 
 #include "editor/command_states.h"
 #include "editor/mode_switch.h"
+#include "model/document.h"
 #include "tests/support/recording_host.h"
 
 #include <algorithm>
@@ -15,19 +16,12 @@ struct EditorRig {
         simulation->FixtureCount = 3;
         simulation->PropCount = 1;
         simulation->Props[1].Name = "Snowman";
-        simulation->Props[1].AssignedCount = 2;
-        simulation->Props[1].Object[1] = 3;
-        simulation->Props[1].Object[2] = 2;
-        const struct {
-            const char* name;
-            int prop;
-            int level;
-        } rows[] = {{"Wreath", 0, 5}, {"arm", 1, 16}, {"Hat", 1, 1}};
-        for (int fixture = 1; fixture <= 3; ++fixture) {
-            ZephFixture& record = simulation->Fixtures[fixture];
-            record.Name = rows[fixture - 1].name;
-            record.AssignedItem = rows[fixture - 1].prop;
-            record.ZOrder = rows[fixture - 1].level;
+        ZephAddFixtureToProp(3, 1, *simulation);
+        ZephAddFixtureToProp(2, 1, *simulation);
+        int fixture = 0;
+        for (const auto& [name, level] : {std::pair{"Wreath", 5}, {"arm", 16}, {"Hat", 1}}) {
+            simulation->Fixtures[++fixture].Name = name;
+            simulation->Fixtures[fixture].ZOrder = level;
         }
     }
 
@@ -68,11 +62,10 @@ public:
     void showModeButtons() override { modeButton = editor.ZephChangeToggle; }
     void CheckEnable(bool) override { calls.push_back("enable"); }
     bool enterSimulation() override {
-        calls.push_back("enter");
-        if (simulationStarts) editor.ZephUIState = kStateSimulation;
-        return simulationStarts;
+        editor.ZephUIState = kStateSimulation;
+        return true;
     }
-    void ZephCleanUpAfterSimulation() override { calls.push_back("clean up"); }
+    void ZephCleanUpAfterSimulation() override {}
     long count(const std::string& call) const { return std::ranges::count(calls, call); }
 
     ZephEditorState& editor;
@@ -81,6 +74,5 @@ public:
     int pressed = -1;
     int modeButton = -1;
     std::int32_t highlighted = 0;
-    bool simulationStarts = true;
     bool listFails = false;
 };

@@ -148,20 +148,15 @@ TEST_F(Parser, AnUnknownSubDrivesTheChannelWithTheTimingBeforeUntilTheCountIsUse
 }
 
 TEST_F(Parser, ConvertsDurationsAndLevelsExactly) {
-    const std::pair<const char*, std::int32_t> durations[] = {
-        {"00000.05", 0}, {"00000.15", 2},        {"00000.25", 2},         {"0000.251", 3},
-        {".1234567", 1}, {"1234567.", 12345670}, {"99999999", 999999990}, {"9999.999", 100000}};
-    for (const auto& [text, ms] : durations)
+    // Hundredths of a second in eight characters become ms, halves the even neighbour.
+    for (const auto& [text, ms] :
+         {std::pair{"00000.05", 0}, {"00000.15", 2}, {"0000.251", 3}, {".1234567", 1}, {"99999999", 999999990}})
         EXPECT_EQ(commandsOf(frame(1, kOne.substr(0, 15) + text + "100000")).at(0).Timing.Duration, ms) << text;
-    const std::pair<const char*, std::int32_t> levels[] = {{"00101", 100}, {"02999", 100}, {"03256", 100},
-                                                           {"03001", 0},   {"03002", 1},   {"03128", 50},
-                                                           {"03253", 99},  {"03254", 100}};
-    for (const auto& [text, intensity] : levels) {  // sub and level
-        const std::string sub(text, 2);
-        EXPECT_EQ(
-            commandsOf(frame(1, "00" + sub + kOne.substr(4, 19) + (text + 2) + "000")).at(0).Timing.StartIntensity,
-            intensity)
-            << text;
+    // Subtype and start level: of subtype 3 in 255ths.
+    for (const auto& [sub, level, percent] :
+         {std::tuple{"01", "101", 100}, {"03", "256", 100}, {"03", "002", 1}, {"03", "253", 99}, {"03", "254", 100}}) {
+        const std::string payload = std::string("00") + sub + kOne.substr(4, 19) + level + "000";
+        EXPECT_EQ(commandsOf(frame(1, payload)).at(0).Timing.StartIntensity, percent) << sub << level;
     }
 }
 
