@@ -105,7 +105,8 @@ TEST(OpenGLSurface, ShowsTheSamePixelsAsTheStandardSurface) {
 TEST(OpenGLSurface, FillsTheShapesOfTheMasksOnce) {
     for (std::int32_t shape = 1; shape <= kBulbShapes; ++shape) {
         for (std::int32_t size = 1; size <= kMaxBulbSize; ++size) {
-            const DarkStage stage(60, 60, size, shape, {{30, 30}});
+            // The second one lies where 16 bits would turn over to 5.
+            const DarkStage stage(60, 60, size, shape, {{30, 30}, {65'541, 5}});
             const QImage drawn = GLRig(stage).frame({lit(128)}, stage.tables);
             const BulbMask& mask = masks().ZephBulbMasks[size][shape];
             const auto covered = [&](int x, int y) {
