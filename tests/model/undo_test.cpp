@@ -22,8 +22,8 @@ struct UndoBench : LoadBench, UndoFace {
     }
     void documentReplaced(bool) override { ++replaced; }
 
-    std::int32_t add(std::int32_t action, int object = 0, std::string_view comment = "", bool keepRedo = false) {
-        EXPECT_TRUE(ZephAddUndoDataXML(action, object, comment, keepRedo, undo, *simulation, stores));
+    std::int32_t add(std::int32_t action, int object = 0) {
+        EXPECT_TRUE(ZephAddUndoDataXML(action, object, "8 bundles", false, undo, *simulation, stores));
         return action;
     }
     // A whole step that changes one name.
@@ -63,7 +63,6 @@ void change(RandomSource& random, UndoBench& bench) {
     const int f = pick(1, std::max(document.FixtureCount, 1));
     const int p = pick(1, std::max(document.PropCount, 1));
     ZephFixture& fixture = document.Fixtures[f];
-    const auto number = [&] { return std::to_string(pick(0, 999)); };
     const bool some = document.FixtureCount > 0;
     const int kind = pick(0, 22);
     if (kind == 0 && some) ZephDeleteThisFixture(f, true, document, bench.watcher);
@@ -71,8 +70,9 @@ void change(RandomSource& random, UndoBench& bench) {
     if (kind == 2 && some && document.PropCount > 0) ZephAddFixtureToProp(f, p, document);
     if (kind == 3 && some) ZephDisassociateFromProp(f, fixture.AssignedItem, document);
     if (kind == 4 && document.FixtureCount < 80) document.Fixtures[++document.FixtureCount] = fixture;
-    if (kind == 5 && document.PropCount < 20) document.Props[++document.PropCount].Name = "P" + number();
-    if (kind == 6) fixture.Name = "\x01 a\r\n\t<&>\"\xC3\xA4\x1F\xEF\xBF\xBE\xEF\xBC\x81" + number();
+    if (kind == 5 && document.PropCount < 20) ++document.PropCount;
+    if (kind == 6)
+        fixture.Name = "\x01 a\r\n\t<&>\"\xC3\xA4\x1F\xEF\xBF\xBE\xEF\xBC\x81" + std::to_string(pick(0, 999));
     if (kind == 7) fixture.PointCount = pick(-1, 300);
     if (kind == 8) fixture.DrawPoints[pick(1, kMaxPoints)] = {kPointBulb, -1, pick(-100000, 100000)};
     if (kind == 9) fixture.ChannelCount = pick(-1, 20);
@@ -85,7 +85,7 @@ void change(RandomSource& random, UndoBench& bench) {
     if (kind == 15) document.Props[p].AssignedCount = pick(-1, 70);
     if (kind == 16) document.Props[p].Object[pick(1, kMaxFixturesInProp)] = pick(-1, 2000);
     if (kind == 17) document.Background = {pick(0, 2), (pick(0, 1) ? bench.folder.path() : "/") + "a\x02.png"};
-    if (kind == 18) document.Levels[pick(1, kLevels)] = {pick(0, 1) == 0, pick(0, 1) == 0, "L" + number()};
+    if (kind == 18) document.Levels[pick(1, kLevels)] = {pick(0, 1) == 0, pick(0, 1) == 0, "L"};
     if (kind == 19) document.Dimmed = pick(-1, 101);
     if (kind == 20) document.Fixtures[kMaxFixtures].Name = "left behind";  // beyond the counts, where no writer looks
     if (kind == 21) document.Props[kMaxProps].AssignedCount = 3;
@@ -175,8 +175,6 @@ TEST(Undo, KeepsTwentyStepsAndRunsBackAndForth) {
 TEST(Undo, DescribesEachActionAndReturnsToItsState) {
     UndoBench bench;
     ZephSimulation& document = *bench.simulation;
-    document.FixtureCount = 2;
-    document.PropCount = 3;
     document.Fixtures[1].Name = "F";
     document.Fixtures[1].AssignedItem = 3;
     document.Props[1].Name = "P1";
@@ -209,7 +207,7 @@ TEST(Undo, DescribesEachActionAndReturnsToItsState) {
         SCOPED_TRACE(row.text);
         ZephStartUndoTransaction(bench.stores);
         bench.ZephUIState = row.state;
-        EXPECT_EQ(bench.add(row.action, row.object, "8 bundles"), row.kept);
+        EXPECT_EQ(bench.add(row.action, row.object), row.kept);
         const ZephUndoEntry& entry = bench.stores.UndoStore.back();
         EXPECT_EQ(entry.Text, row.text);
         EXPECT_EQ(entry.EditorMode, row.mode);
@@ -222,15 +220,13 @@ TEST(Undo, DescribesEachActionAndReturnsToItsState) {
 
 TEST(Undo, ARunOfLevelStepsIsOneStep) {
     UndoBench bench;
-    for (const auto& [action, steps] : {std::pair{kUndoMovedForward, 1},
-                                        {kUndoMovedForward, 1},
-                                        {kUndoMovedBackward, 2},
-                                        {kUndoMovedForward, 3},
-                                        {kUndoChanged, 4},
-                                        {kUndoChanged, 5}}) {
-        bench.step(action, 1 + steps % 2, "changed");
-        EXPECT_EQ(bench.stores.UndoPosition, steps);
+    std::vector<int> steps;
+    for (const std::int32_t action :
+         {kUndoMovedForward, kUndoMovedForward, kUndoMovedBackward, kUndoMovedForward, kUndoChanged, kUndoChanged}) {
+        bench.step(action, 1, "changed");
+        steps.push_back(bench.stores.UndoPosition);
     }
+    EXPECT_EQ(steps, (std::vector{1, 1, 2, 3, 4, 5}));
 }
 
 TEST(Undo, ARollbackLeavesNoStepAndNothingToRedo) {
