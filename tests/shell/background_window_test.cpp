@@ -1,77 +1,48 @@
-#include "shell/main_window.h"
-#include "tests/shell/shell_rig.h"
-#include "tests/support/recording_host.h"
+#include "tests/shell/window_rig.h"
 
-#include <QAction>
-#include <QApplication>
 #include <QDialog>
-#include <QLabel>
 #include <QLineEdit>
 #include <QPointer>
-#include <QPushButton>
 #include <QRadioButton>
 #include <QSlider>
-#include <QTest>
 #include <QTimer>
 
 namespace {
 
-// The window's host, but boxes are noted and answered from a script.
-class ScriptedWindowHost : public WindowHost {
-public:
-    BoxAnswer messageBox(std::string_view title, std::string_view text, BoxIcon icon, BoxButtons buttons) override {
-        return script.messageBox(title, text, icon, buttons);
-    }
-    RecordingHost script;
-};
-
-struct BackgroundWindow : testing::Test {
+struct BackgroundWindow : WindowRig {
     void SetUp() override {
         // A dialog that nobody works would hold the test for ever.
         guard.callOnTimeout([] {
-            auto* dialog = qobject_cast<QDialog*>(QApplication::activeModalWidget());
-            if (dialog == nullptr) return;
-            ADD_FAILURE() << "left open: " << dialog->windowTitle().toStdString();
-            dialog->done(QDialog::Rejected);
+            const QWidget* left = QApplication::activeModalWidget();
+            if (left != nullptr) qFatal("left open: %s", qPrintable(left->windowTitle()));
         });
         guard.start(10'000);
-        rig.start();
-        rig.startUp(window);
-        window.resize(1024, 700);
-        window.show();
-        ASSERT_TRUE(QTest::qWaitForWindowActive(&window));
+        working.callOnTimeout([this] { workDialog(); });
+        working.start(20);
+        WindowRig::SetUp();
+        show();
         QImage house(40, 20, QImage::Format_RGB32);
         house.fill(qRgb(200, 100, 50));
-        house.save(rig.folder.filePath("house.png"));
+        house.save(folder.qPath("house.png"));
     }
     // A display of 60 x 30 pixels with one bulb at (20, 10).
     bool open(const std::string& picture, bool quiet = false, int widthPx = 60) {
-        const auto display = std::make_unique<ZephSimulation>();
-        ShellRig::buildDisplay(*display);
         display->Background.BackgroundType = picture.empty() ? 0 : kBackgroundPicture;
         display->Background.PicFileName = picture;
         display->Background.EditorWidthTwips = widthPx * TwipsPerPixelX;
-        return window.openFile(QString::fromStdString(rig.save(*display, "bulb.zee")), quiet);
+        return openFile(quiet);
     }
     // The modal dialogs that the next step opens, one after the other.
-    void expectDialogs(std::vector<std::function<void(QDialog&)>> work) {
-        waiting = std::move(work);
-        QTimer::singleShot(0, &window, [this] { workDialog(); });
-    }
+    void expectDialogs(std::vector<std::function<void(QDialog&)>> work) { waiting = std::move(work); }
     void workDialog() {
-        if (waiting.empty()) return;
         auto* dialog = qobject_cast<QDialog*>(QApplication::activeModalWidget());
-        if (dialog != nullptr && dialog != last) {
-            last = dialog;
-            const auto work = waiting.front();
-            waiting.erase(waiting.begin());
-            QTimer::singleShot(0, &window, [this] { workDialog(); });
-            work(*dialog);
-            return;
-        }
-        QTimer::singleShot(20, &window, [this] { workDialog(); });
+        if (waiting.empty() || dialog == nullptr || dialog == last) return;
+        last = dialog;
+        const auto work = waiting.front();
+        waiting.erase(waiting.begin());
+        work(*dialog);
     }
-    void run(const char* command) { window.findChild<QAction*>(command)->trigger(); }
+    void run(const char* command) { action(command)->trigger(); }
     static void press(QDialog& dialog, const char* button) {
         QTest::mouseClick(dialog.findChild<QPushButton*>(button), Qt::LeftButton);
     }
@@ -89,19 +60,15 @@ struct BackgroundWindow : testing::Test {
         press(dialog, "cmdResize");
         press(dialog, "cmdOK");
     }
-    const ZephSimulation& document() const { return *rig.program.simulation; }
-    QColor canvasAt(int x, int y) { return window.findChild<QWidget*>("picMain")->grab().toImage().pixelColor(x, y); }
     std::vector<std::string> titles() const {
         std::vector<std::string> shown;
-        for (const RecordingHost::Box& box : host.script.boxes)
+        for (const RecordingHost::Box& box : host.notes.boxes)
             shown.push_back(box.title.substr(kProgramName.size()));
         return shown;
     }
 
-    ScriptedWindowHost host;
-    ShellRig rig{host};
-    frmZephMain window{rig.program, host};
     QTimer guard;
+    QTimer working;
     std::vector<std::function<void(QDialog&)>> waiting;
     QPointer<QDialog> last;  // forgets it once it is gone: the next one may lie at its place
 };
@@ -112,22 +79,18 @@ using Titles = std::vector<std::string>;
 
 TEST_F(BackgroundWindow, ANewSimulationAsksFirstAndReplacesTheOldOne) {
     ASSERT_TRUE(open(""));
-    rig.program.simulation->SimulationDirty = true;
+    document().SimulationDirty = true;
     run("mnuFileNew");
-    ASSERT_EQ(host.script.boxes.size(), 1U);
-    EXPECT_EQ(host.script.boxes[0].title, "Qen Visualizer-Save?");
-    EXPECT_EQ(host.script.boxes[0].text,
-              "This editor session has not been saved.  Are you sure you want to start a new one?");
+    EXPECT_EQ(host.notes.boxTexts(), "Qen Visualizer-Save?|This editor session has not been saved.  Are you sure you "
+                                     "want to start a new one?");
     EXPECT_EQ(document().FixtureCount, 1);
 
-    host.script.answers = {BoxAnswer::Yes};
+    host.notes.answers = {BoxAnswer::Yes};
     expectDialogs({[&](QDialog& dialog) {
-        EXPECT_EQ(dialog.objectName(), "frmZephNewSimulation");
         const QWidget* band = window.findChild<QWidget*>("CoolBar1");
         EXPECT_GE(dialog.y(), band->mapToGlobal(QPoint(0, band->height())).y());
         auto* ok = dialog.findChild<QPushButton*>("OKButton");
         auto* width = dialog.findChild<QLineEdit*>("mskWidth");
-        EXPECT_EQ(width->text(), "0");
         width->selectAll();
         QTest::keyClicks(width, "7-01234");
         EXPECT_EQ(width->text(), "7012");  // four digits
@@ -142,16 +105,25 @@ TEST_F(BackgroundWindow, ANewSimulationAsksFirstAndReplacesTheOldOne) {
     }});
     run("mnuFileNew");
     EXPECT_EQ(document().FixtureCount, 0);
-    EXPECT_TRUE(document().SimulationOpen);
     EXPECT_FALSE(document().SimulationDirty);
     EXPECT_EQ(document().FileName, "");
-    EXPECT_EQ(window.windowTitle().toStdString(), ZephWindowTitle(""));
-    EXPECT_EQ(window.findChild<QWidget*>("picMain")->size(), QSize(70, 50));
-    EXPECT_TRUE(window.findChild<QAction*>("mnuBackgroundProperties")->isEnabled());
+    EXPECT_EQ(find<QWidget>("picMain")->size(), QSize(70, 50));
 }
 
-TEST_F(BackgroundWindow, ANewSimulationThatIsTooLargeGoesThroughTheBackgroundDialog) {
-    ASSERT_TRUE(open(""));
+TEST_F(BackgroundWindow, WhatIsTooLargeGoesThroughTheBackgroundDialog) {
+    expectDialogs({[](QDialog& dialog) {
+        EXPECT_FALSE(dialog.findChild<QPushButton*>("cmdCancel")->isVisible());
+        QTest::keyClick(&dialog, Qt::Key_Escape);
+        EXPECT_TRUE(dialog.isVisible());
+        resizeAndAccept(dialog, "2500");
+    }});
+    ASSERT_TRUE(open("", false, 2501));
+    EXPECT_EQ(titles(), Titles{"-Maximum Size"});
+    EXPECT_EQ(find<QWidget>("picMain")->width(), 2500);
+    EXPECT_TRUE(document().SimulationDirty);
+    ASSERT_TRUE(open("", false, 2500));
+    EXPECT_EQ(titles(), Titles{"-Maximum Size"});
+
     const auto tooLarge = [](QDialog& dialog) {
         type(dialog, "mskWidth", "5000");
         type(dialog, "mskHeight", "100");
@@ -159,7 +131,7 @@ TEST_F(BackgroundWindow, ANewSimulationThatIsTooLargeGoesThroughTheBackgroundDia
     };
     expectDialogs({tooLarge, [](QDialog& dialog) { dialog.reject(); }});
     run("mnuFileNew");
-    EXPECT_EQ(titles(), Titles{"-Maximum Size"});
+    EXPECT_EQ(titles(), (Titles{"-Maximum Size", "-Maximum Size"}));
     EXPECT_EQ(document().FileName, "bulb.zee");  // given up: the old display is whole
     EXPECT_EQ(document().FixtureCount, 1);
     expectDialogs({tooLarge, [](QDialog& dialog) {
@@ -168,12 +140,12 @@ TEST_F(BackgroundWindow, ANewSimulationThatIsTooLargeGoesThroughTheBackgroundDia
                    }});
     run("mnuFileNew");
     EXPECT_EQ(document().FileName, "");
-    EXPECT_EQ(window.findChild<QWidget*>("picMain")->size(), QSize(2500, 50));
+    EXPECT_EQ(find<QWidget>("picMain")->size(), QSize(2500, 50));
 }
 
 TEST_F(BackgroundWindow, TheBackgroundDialogMovesPointsAndKeepsTheBandInStep) {
     ASSERT_TRUE(open(""));
-    rig.program.editor.ZephSelection.Object = 1;
+    program.editor.ZephSelection.Object = 1;
     auto* band = window.findChild<QWidget*>("CoolBar1")->findChild<QSlider*>("sldIntensity");
     band->setValue(90);  // its timer is still to come
     expectDialogs({[&](QDialog& dialog) {
@@ -184,20 +156,23 @@ TEST_F(BackgroundWindow, TheBackgroundDialogMovesPointsAndKeepsTheBandInStep) {
     }});
     run("mnuBackgroundProperties");
     EXPECT_EQ(band->value(), 50);
-    EXPECT_EQ(document().Background.PicIntensity, 50);
     EXPECT_EQ(document().Fixtures[1].DrawPoints[1],
               (ZephDrawPoint{kPointBulb, 40 * TwipsPerPixelX, 20 * TwipsPerPixelY}));
     EXPECT_EQ(canvasAt(40, 20), QColor(255, 0, 0));
     EXPECT_EQ(canvasAt(115, 55), QColor(127, 127, 127));
-    EXPECT_EQ(rig.program.editor.ZephSelection.Object, 0);
-    EXPECT_TRUE(document().SimulationDirty);
-    EXPECT_EQ(window.findChild<QLabel*>("StatusBar1Panel1")->text(), "Changed");
+    EXPECT_EQ(program.editor.ZephSelection.Object, 0);
+    EXPECT_EQ(panel(1), "Changed");
     QTest::qWait(800);
     EXPECT_EQ(document().Background.PicIntensity, 50);  // the band's timer has nothing left to say
+    band->setValue(0);
+    EXPECT_EQ(band->toolTip(), "0 %");
+    EXPECT_EQ(document().Background.PicIntensity, 50) << "taken over once the slider rests";
+    QTest::qWait(800);
+    EXPECT_EQ(canvasAt(115, 55), QColor(0, 0, 0));
 }
 
 TEST_F(BackgroundWindow, APictureIsFoundBesideTheDisplayOrAskedForUnlessTheLoadIsQuiet) {
-    const std::string house = rig.folder.filePath("house.png").toStdString();
+    const std::string house = folder.path("house.png");
     ASSERT_TRUE(open("/old/place/house.png"));
     EXPECT_TRUE(titles().empty());
     EXPECT_EQ(document().Background.PicFileName, house);
@@ -213,11 +188,10 @@ TEST_F(BackgroundWindow, APictureIsFoundBesideTheDisplayOrAskedForUnlessTheLoadI
     ASSERT_TRUE(open("/gone/other.png"));
     EXPECT_EQ(document().Background.PicFileName, "/gone/other.png");
     EXPECT_FALSE(document().SimulationDirty);
-    EXPECT_EQ(canvasAt(55, 25), QColor(255, 255, 255));
 
-    host.script.boxes.clear();
-    const auto choose = [&](const char* file) {
-        return [path = rig.folder.filePath(file)](QDialog& dialog) {
+    host.notes.boxes.clear();
+    const auto choose = [&](const char* wanted) {
+        return [path = folder.qPath(wanted)](QDialog& dialog) {
             auto* name = dialog.findChild<QLineEdit*>("fileNameEdit");
             name->setText(path);
             QTest::keyClick(name, Qt::Key_Return);
@@ -229,19 +203,4 @@ TEST_F(BackgroundWindow, APictureIsFoundBesideTheDisplayOrAskedForUnlessTheLoadI
     EXPECT_EQ(document().Background.PicFileName, house);
     EXPECT_TRUE(document().SimulationDirty);
     EXPECT_EQ(canvasAt(55, 25), QColor(200, 100, 50));
-}
-
-TEST_F(BackgroundWindow, ALoadedDisplayThatIsTooLargeMustBeResized) {
-    expectDialogs({[](QDialog& dialog) {
-        EXPECT_FALSE(dialog.findChild<QPushButton*>("cmdCancel")->isVisible());
-        QTest::keyClick(&dialog, Qt::Key_Escape);
-        EXPECT_TRUE(dialog.isVisible());
-        resizeAndAccept(dialog, "2500");
-    }});
-    ASSERT_TRUE(open("", false, 2501));
-    EXPECT_EQ(titles(), Titles{"-Maximum Size"});
-    EXPECT_EQ(window.findChild<QWidget*>("picMain")->width(), 2500);
-    EXPECT_TRUE(document().SimulationDirty);
-    ASSERT_TRUE(open("", false, 2500));
-    EXPECT_EQ(titles(), Titles{"-Maximum Size"});
 }

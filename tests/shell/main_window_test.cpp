@@ -1,8 +1,6 @@
 #include "engine/dialogs/compile_errors_dialog.h"
 #include "tests/shell/window_rig.h"
-#include "tests/support/fixtures.h"
 
-#include <QApplication>
 #include <QMenuBar>
 #include <QMessageBox>
 #include <QPlainTextEdit>
@@ -16,59 +14,68 @@ using Strings = std::vector<std::string>;
 const QColor kRedBulb(255, 0, 0);
 const QColor kWhiteCanvas(255, 255, 255);
 
+// A frame with one plain command for unit 1, circuit 1, at once to 100 per cent.
+const std::string kBulbFrame = "\x01"
+                               "001"   // one payload
+                               "0036"  // 7 + 29 characters
+                               "0000"  // light command, plain
+                               "00001001001"
+                               "00000000"
+                               "100100\x04";
+
 // The window and a display of one red bulb.
 struct MainWindow : WindowRig {
-    void SetUp() override {
-        WindowRig::SetUp();
-        ShellRig::buildDisplay(*display);
-        file = rig.save(*display, "bulb.zee");
-    }
-    void openBulb() { open(*display, "bulb.zee"); }
+    void simulate() { action("mnuSimulationMode")->trigger(); }
     void enter() {
-        openBulb();
-        find<QAction>("mnuSimulationMode")->trigger();
-        ASSERT_TRUE(rig.program.simulating());
+        open();
+        simulate();
+        ASSERT_TRUE(program.simulating());
     }
     void arrive(const std::string& bytes) {
-        rig.socket.reads.push_back(bytes);
-        rig.socket.dataArrival();
+        socket.reads.push_back(bytes);
+        socket.dataArrival();
     }
     void expectEditor() {
-        EXPECT_FALSE(rig.program.simulating());
+        run(2);
+        EXPECT_FALSE(program.simulating());
         EXPECT_EQ(panel(2), "Select Fixture");
     }
     // Lets the timer run on a clock that moves on.
     void run(int ticks) {
         for (int tick = 0; tick < ticks; ++tick) {
-            rig.clock.set(rig.clock.timeGetTime() + 10);
+            clock.set(clock.timeGetTime() + 10);
             QTest::qWait(12);
         }
     }
-
-    std::unique_ptr<ZephSimulation> display = std::make_unique<ZephSimulation>();
 };
 
 }  // namespace
 
-TEST_F(MainWindow, ShowsTheDisplayOfTheCommandLine) {
+TEST_F(MainWindow, ShowsTheDisplayOfTheCommandLineOrNone) {
+    program.parms.FileToOpen = "/nowhere/gone.zee";
+    window.start();
+    EXPECT_EQ(document().FileName, "");
+    EXPECT_EQ(document().FilePath, "");
+    EXPECT_FALSE(action("mnuSimulationMode")->isEnabled());
+
+    open();
     const QString working = QDir::currentPath();
-    QDir::setCurrent(rig.folder.path());
-    rig.program.parms.FileToOpen = "bulb.zee";  // relative to the working folder
+    QDir::setCurrent(folder.qPath());
+    program.parms.FileToOpen = "bulb.zee";  // relative to the working folder
     window.start();
     QDir::setCurrent(working);
     EXPECT_EQ(window.windowTitle(), "Qen Visualizer v1.0.0 -bulb.zee");
     EXPECT_EQ(panel(2), "Select Fixture");
     EXPECT_EQ(find<QWidget>("picMain")->size(), QSize(60, 30));
-    EXPECT_EQ(canvasAt(20, 10), QColor(255, 0, 0));
-    EXPECT_EQ(canvasAt(50, 25), QColor(255, 255, 255));
-}
+    EXPECT_EQ(canvasAt(20, 10), kRedBulb);
+    EXPECT_EQ(canvasAt(50, 25), kWhiteCanvas);
 
-TEST_F(MainWindow, AQuietFileThatFailsClearsBothNames) {
-    rig.program.parms.FileToOpen = "/nowhere/gone.zee";
-    window.start();
-    EXPECT_EQ(rig.program.simulation->FileName, "");
-    EXPECT_EQ(rig.program.simulation->FilePath, "");
-    EXPECT_FALSE(find<QAction>("mnuSimulationMode")->isEnabled());
+    EXPECT_FALSE(window.openFile(folder.qPath("gone.zee"), false));
+    EXPECT_FALSE(document().SimulationOpen);
+    EXPECT_EQ(document().FixtureCount, 0);
+    EXPECT_TRUE(program.picBackground.isNull());
+    EXPECT_THAT(host.notes.boxTexts(), testing::StartsWith("Qen Visualizer-Editor Load Error|"));
+    EXPECT_EQ(window.windowTitle(), "Qen Visualizer v1.0.0 -bulb.zee");  // the title keeps what it had
 }
 
 TEST_F(MainWindow, SimulatesAndComesBackByEsc) {
@@ -78,138 +85,121 @@ TEST_F(MainWindow, SimulatesAndComesBackByEsc) {
     EXPECT_EQ(Strings(told.end() - 3, told.end()),
               (Strings{"Opening data connection...", "Setting Emulation Timer Attributes...",
                        "UDP Simulation active on 127.0.0.1 (30303)"}));
-    EXPECT_EQ(panel(2), "UDP Simulation active on 127.0.0.1 (30303)");
     EXPECT_EQ(find<QTimer>("hrTimer1")->interval(), 9);
-    EXPECT_FALSE(window.menuBar()->isVisible());
-    EXPECT_FALSE(find<QWidget>("CoolBar1")->isVisible());
-    EXPECT_TRUE(find<QProgressBar>("prbQueueLen")->isVisible());
-    EXPECT_TRUE(find<QPushButton>("cmdStop")->isVisible());
     EXPECT_EQ(canvasAt(20, 10), kWhiteCanvas);
-    arrive(bulbFrame("100"));
+    for (const char* hidden : {"CoolBar1", "flgObjectSelect", "chkCmdFixtureOrProp(0)", "chkCmdFixtureOrProp(1)"})
+        EXPECT_FALSE(visible(hidden)) << hidden;
+    for (const char* shown : {"cmdStop", "cmdSEPlay", "cmdSEStop", "prbQueueLen"})
+        EXPECT_TRUE(visible(shown)) << shown;
+    EXPECT_FALSE(window.menuBar()->isVisible());
+    key(Qt::Key_F2);  // the editor's keys are frozen
+    key(Qt::Key_F5);
+    ASSERT_TRUE(program.simulating());
+    arrive(kBulbFrame);
     run(110);
     EXPECT_EQ(canvasAt(20, 10), kRedBulb);
     EXPECT_TRUE(panel(3).startsWith("FPS:")) << panel(3).toStdString();
 
     key(Qt::Key_Escape);
-    run(2);
     expectEditor();
-    EXPECT_TRUE(window.menuBar()->isVisible());
-    EXPECT_FALSE(find<QPushButton>("cmdStop")->isVisible());
+    EXPECT_TRUE(visible("flgObjectSelect") && window.menuBar()->isVisible());
     EXPECT_EQ(panel(3), "");
     EXPECT_EQ(window.size(), QSize(1024, 700));
     EXPECT_EQ(canvasAt(20, 10), kRedBulb);  // the editor shows every light
-    EXPECT_EQ(rig.program.tables.RenderDataCount, 0);
+    EXPECT_EQ(program.tables.RenderDataCount, 0);
 
-    arrive(bulbFrame("100"));  // between two simulations: thrown away
-    find<QAction>("mnuSimulationMode")->trigger();
+    arrive(kBulbFrame);  // between two simulations: thrown away
+    simulate();
     run(3);
     EXPECT_EQ(canvasAt(20, 10), kWhiteCanvas);
-    EXPECT_EQ(std::ranges::count(rig.socket.calls, "bind 127.0.0.1 30303"), 1) << "the socket stays open";
-}
+    EXPECT_EQ(std::ranges::count(socket.calls, "bind 127.0.0.1 30303"), 1) << "the socket stays open";
 
-TEST_F(MainWindow, ReturnsToTheEditorFromEachFailureToEnter) {
-    openBulb();
-    ZephSimulation& simulation = *rig.program.simulation;
-    const std::pair<std::function<void()>, const char*> rows[] = {
-        {[&] { simulation.Fixtures[1].ChannelCount = 0; }, "Qen Visualizer-Error|"},
-        {[&] { rig.socket.taken = true; }, "Qen Visualizer-Port Error|"},
-        {[&] { rig.clock.set(-1); }, "Qen Visualizer-Error:  Reboot Required|"},
-        {[&] { rig.program.RenderEngine = kEngineOpenGL; }, ""},  // there is no context on this platform
-    };
-    for (const auto& [spoil, box] : rows) {
-        host.notes.boxes.clear();
-        spoil();
-        find<QAction>("mnuSimulationMode")->trigger();
-        EXPECT_FALSE(rig.program.simulating());
-        // The refusal of a clock that runs backwards stays in view.
-        EXPECT_EQ(panel(2), rig.clock.timeGetTime() < 0 ? "Can not enter simulation mode:  Time is running backwards."
-                                                        : "Select Fixture");
-        EXPECT_FALSE(find<QTimer>("hrTimer1")->isActive());
-        EXPECT_TRUE(window.isVisible());
-        EXPECT_THAT(host.notes.boxTexts(), testing::StartsWith(box));
-        EXPECT_EQ(host.notes.boxes.size(), *box ? 1u : 0u) << box;
-        simulation.Fixtures[1].ChannelCount = 1;
-        rig.socket.taken = false;
-        rig.clock.set(100'000);
-        rig.program.RenderEngine = kEngineStandard;
-    }
-    EXPECT_THAT(host.notes.panel2History, testing::Contains("Creating Rendering Window"));
-    find<QAction>("mnuSimulationMode")->trigger();
-    EXPECT_TRUE(rig.program.simulating());
-}
-
-TEST_F(MainWindow, TakesAssembledRibbonsApartAgain) {
-    openBulb();
-    ZephSimulation& simulation = *rig.program.simulation;
-    for (const int pixel : {1, 4}) {
-        ZephFixture& ribbon = addFixture(simulation, kFixtureKesh, {{5, 5}});
-        ribbon.Kesh.Base_Unit = 5;
-        ribbon.Kesh.Physical_Pixel_Number = pixel;
-    }
-    find<QAction>("mnuSimulationMode")->trigger();
-    EXPECT_EQ(simulation.Fixtures[2].PointCount, 4);  // its own, two that are not drawn, and the child's
-    key(Qt::Key_Escape);
-    EXPECT_EQ(simulation.Fixtures[2].PointCount, 1);
-
-    simulation.Fixtures[3].Kesh.Physical_Pixel_Number = 1;  // two pieces on the same pixel
-    find<QAction>("mnuSimulationMode")->trigger();
-    expectEditor();
-    EXPECT_EQ(host.notes.compileErrors.size(), 1U);
-    EXPECT_EQ(simulation.Fixtures[2].PointCount, 1);
-}
-
-TEST_F(MainWindow, AFileThatCannotBeOpenedLeavesAnEmptyWindow) {
-    openBulb();
-    EXPECT_FALSE(window.openFile(rig.folder.filePath("gone.zee"), false));
-    EXPECT_FALSE(rig.program.simulation->SimulationOpen);
-    EXPECT_TRUE(rig.program.picBackground.isNull());
-    EXPECT_EQ(rig.program.simulation->FixtureCount, 0);
-    EXPECT_THAT(host.notes.boxTexts(), testing::StartsWith("Qen Visualizer-Editor Load Error|"));
-    EXPECT_EQ(window.windowTitle(), "Qen Visualizer v1.0.0 -bulb.zee");  // the title keeps what it had
-}
-
-TEST_F(MainWindow, TheGaugeShowsWhatWaits) {
-    enter();
-    rig.program.receive.Stream.ZephStackBuffer.append("\x01" + std::string(1'600'000, '0'));  // no frame ends here
+    program.receive.Stream.ZephStackBuffer.append("\x01" + std::string(1'600'000, '0'));  // no frame ends here
     arrive("0");
     EXPECT_EQ(find<QProgressBar>("prbQueueLen")->value(), 1'600'001);
     EXPECT_TRUE(find<QProgressBar>("prbQueueLen")->styleSheet().contains("#ffff00"));
 }
 
+TEST_F(MainWindow, ReturnsToTheEditorFromEachFailureToEnter) {
+    open();
+    const std::pair<std::function<void()>, const char*> rows[] = {
+        {[&] { document().Fixtures[1].ChannelCount = 0; }, "Qen Visualizer-Error|"},
+        {[&] { socket.taken = true; }, "Qen Visualizer-Port Error|"},
+        {[&] { clock.set(-1); }, "Qen Visualizer-Error:  Reboot Required|"},
+        {[&] { program.RenderEngine = kEngineOpenGL; }, ""},  // there is no context on this platform
+    };
+    for (const auto& [spoil, box] : rows) {
+        host.notes.boxes.clear();
+        spoil();
+        simulate();
+        EXPECT_FALSE(program.simulating());
+        // The refusal of a clock that runs backwards stays in view.
+        EXPECT_EQ(panel(2), clock.timeGetTime() < 0 ? "Can not enter simulation mode:  Time is running backwards."
+                                                    : "Select Fixture");
+        EXPECT_FALSE(find<QTimer>("hrTimer1")->isActive());
+        EXPECT_TRUE(window.isVisible());
+        EXPECT_THAT(host.notes.boxTexts(), testing::StartsWith(box));
+        EXPECT_EQ(host.notes.boxes.size(), *box ? 1u : 0u) << box;
+        document().Fixtures[1].ChannelCount = 1;
+        socket.taken = false;
+        clock.set(100'000);
+        program.RenderEngine = kEngineStandard;
+    }
+    EXPECT_THAT(host.notes.panel2History, testing::Contains("Creating Rendering Window"));
+    simulate();
+    EXPECT_TRUE(program.simulating());
+}
+
+TEST_F(MainWindow, TakesAssembledRibbonsApartAgain) {
+    for (const int pixel : {1, 4}) {
+        ZephFixture& ribbon = addFixture(*display, kFixtureKesh, {{5, 5}});
+        ribbon.Kesh.Base_Unit = 5;
+        ribbon.Kesh.Physical_Pixel_Number = pixel;
+    }
+    enter();
+    EXPECT_EQ(document().Fixtures[2].PointCount, 4);  // its own, two that are not drawn, and the child's
+    key(Qt::Key_Escape);
+    EXPECT_EQ(document().Fixtures[2].PointCount, 1);
+
+    document().Fixtures[3].Kesh.Physical_Pixel_Number = 1;  // two pieces on the same pixel
+    simulate();
+    expectEditor();
+    EXPECT_EQ(host.notes.compileErrors.size(), 1U);
+    EXPECT_EQ(document().Fixtures[2].PointCount, 1);
+}
+
 TEST_F(MainWindow, StoppingAndClosingEndASimulationOnlyUnlessTheSettingSaysMore) {
     enter();
-    click<QPushButton>("cmdStop");
-    run(2);
-    EXPECT_FALSE(rig.program.simulating());
+    click("cmdStop");
+    expectEditor();
 
-    find<QAction>("mnuSimulationMode")->trigger();
-    ASSERT_TRUE(rig.program.simulating());
+    simulate();
+    ASSERT_TRUE(program.simulating());
     EXPECT_FALSE(window.close());
-    run(2);
-    EXPECT_FALSE(rig.program.simulating());
+    expectEditor();
     EXPECT_TRUE(window.isVisible());
 
-    rig.program.settings.EndStopsSimulation = false;
-    find<QAction>("mnuSimulationMode")->trigger();
+    program.settings.EndStopsSimulation = false;
+    simulate();
     window.close();
     run(2);
-    EXPECT_FALSE(rig.program.simulating());
+    EXPECT_FALSE(program.simulating());
     EXPECT_FALSE(window.isVisible());
-    EXPECT_EQ(rig.socket.State(), 0);
+    EXPECT_EQ(socket.State(), 0);
 }
 
 TEST_F(MainWindow, TellsOfADisplayWithoutChannels) {
-    openBulb();
+    open();
     host.seen = true;
-    rig.program.simulation->Fixtures[1].ChannelCount = 0;
+    document().Fixtures[1].ChannelCount = 0;
     QString told;
     QTimer::singleShot(50, &window, [&] {
         auto* box = qobject_cast<QMessageBox*>(QApplication::activeModalWidget());
         ASSERT_NE(box, nullptr);
         told = box->windowTitle() + "|" + box->text();
-        box->button(QMessageBox::Ok)->click();
+        QTest::mouseClick(box->button(QMessageBox::Ok), Qt::LeftButton);
     });
-    find<QAction>("mnuSimulationMode")->trigger();
+    simulate();
     EXPECT_EQ(told, "Qen Visualizer-Error|There are no channels to simulate.");
     EXPECT_EQ(panel(2), "Select Fixture");
 }
@@ -218,16 +208,13 @@ TEST(CompileErrors, SelectsItsTextOnFocusAndClosesByItsButton) {
     frmZephCompileErrors dialog;
     dialog.SetErrorMessage("first\r\nsecond");
     auto* txtError = dialog.findChild<QPlainTextEdit*>("txtError");
-    auto* cmdOK = dialog.findChild<QPushButton*>("cmdOK");
-    ASSERT_TRUE(txtError && cmdOK);
-    EXPECT_TRUE(txtError->isReadOnly());
     EXPECT_EQ(txtError->toPlainText(), "first\nsecond");
     dialog.show();
     ASSERT_TRUE(QTest::qWaitForWindowActive(&dialog));
     txtError->setFocus();
     QTest::qWait(20);
     EXPECT_EQ(txtError->textCursor().selectedText().size(), 12);
-    QTest::mouseClick(cmdOK, Qt::LeftButton);
+    QTest::mouseClick(dialog.findChild<QPushButton*>("cmdOK"), Qt::LeftButton);
     EXPECT_FALSE(dialog.isVisible());
 }
 

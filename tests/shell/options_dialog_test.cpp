@@ -1,5 +1,6 @@
 #include "shell/dialogs/options_dialog.h"
 #include "shell/edit_options.h"
+#include "tests/shell/controls.h"
 #include "tests/shell/settings_rig.h"
 
 #include <QApplication>
@@ -11,12 +12,11 @@
 #include <QSlider>
 #include <QSpinBox>
 #include <QTabWidget>
-#include <QTest>
 #include <QTimer>
 
 namespace {
 
-struct OptionsDialog : testing::Test, SettingsRig {
+struct OptionsDialog : testing::Test, Controls, SettingsRig {
     OptionsDialog() {
         store.set("Adapter To Use", "Stage");
         EXPECT_TRUE(read());
@@ -24,17 +24,22 @@ struct OptionsDialog : testing::Test, SettingsRig {
     // Makes and shows the dialog on what the test has set up.
     void open() {
         const auto pick = [this](std::int32_t, const QString&, QWidget*) { return picked; };
-        const OptionsDesk desk{host, [this] { ++resets; }, pick};
-        dialog = std::make_unique<frmZephOptions>(ZephOptionsDraftOf(settings, connection), adapters, desk);
+        own = std::make_unique<frmZephOptions>(ZephOptionsDraftOf(settings, connection), adapters,
+                                               OptionsDesk{host, [] {}, pick});
+        dialog = own.get();
         dialog->show();
     }
-    template <typename Widget>
-    Widget* find(const char* name) {
-        Widget* widget = dialog->findChild<Widget*>(name);
-        if (widget == nullptr) throw Failure(std::string("there is no ") + name);
-        return widget;
+    // Opens the dialog as the menu does and works it from inside its own event loop.
+    OptionsOutcome edit(const std::function<void()>& work) {
+        QTimer::singleShot(0, [&] {
+            dialog = dynamic_cast<frmZephOptions*>(QApplication::activeModalWidget());
+            ASSERT_NE(dialog, nullptr);
+            work();
+            if (dialog->isVisible()) dialog->reject();
+        });
+        return ZephEditOptions(context, nullptr, settings, connection, adapters);
     }
-    void click(const char* name) { QTest::mouseClick(find<QPushButton>(name), Qt::LeftButton); }
+    QWidget& shown() override { return *dialog; }
     void choose(const char* name, const QString& text) {
         auto* box = find<QComboBox>(name);
         ASSERT_GE(box->findText(text), 0) << name;
@@ -43,8 +48,8 @@ struct OptionsDialog : testing::Test, SettingsRig {
     bool accepted() const { return dialog->result() == QDialog::Accepted && !dialog->isVisible(); }
 
     std::optional<std::int32_t> picked;
-    int resets = 0;
-    std::unique_ptr<frmZephOptions> dialog;
+    std::unique_ptr<frmZephOptions> own;
+    frmZephOptions* dialog = nullptr;
 };
 
 }  // namespace
@@ -55,12 +60,12 @@ TEST_F(OptionsDialog, OkWithoutAChangeGivesTheSettingsBackAsTheyWere) {
     settings.FloodOpacity = 52;
     settings.LastOptsTab = 3;
     open();
-    EXPECT_EQ(find<QTabWidget>("tabOptions")->count(), 6);
     EXPECT_EQ(find<QTabWidget>("tabOptions")->currentIndex(), 3);
     EXPECT_EQ(find<QComboBox>("cmbAutoSave")->placeholderText(), "7 Minutes");
     EXPECT_EQ(find<QComboBox>("cmbMaxOpacity")->placeholderText(), "52 %");
     EXPECT_FALSE(find<QComboBox>("cmbKeshBulbShape")->isEnabled());
     EXPECT_EQ(find<QComboBox>("cmbKeshBulbShape")->currentText(), "Pixel Bulb");
+    click("cmdToolHandleColor");  // the color dialog is left without a choice
     click("cmdOK");
     ASSERT_TRUE(accepted());
     EXPECT_EQ(dialog->draft().Settings, settings);
@@ -89,6 +94,7 @@ TEST_F(OptionsDialog, EveryControlChangesItsOwnSettingAndNoOther) {
         want(parts[3], parts[4]);
     }
     EXPECT_EQ(find<QLabel>("lblPixelFlashSpeed")->text(), "1000 ms");
+    EXPECT_EQ(find<QPushButton>("cmdFixtureTextColor")->text(), "#030201");  // of a number in which blue stands highest
     find<QTabWidget>("tabOptions")->setCurrentIndex(5);
     want("Last Opts Tab", "5");
     find<QLineEdit>("txtZephPort")->setFocus();
@@ -100,47 +106,23 @@ TEST_F(OptionsDialog, EveryControlChangesItsOwnSettingAndNoOther) {
     settings = dialog->draft().Settings;
     write();
     EXPECT_EQ(store.values, wanted);
-    EXPECT_EQ(dialog->draft().Link.ZephAdapterName, "Local");
-    EXPECT_EQ(dialog->draft().Link.ZephAdapterIP, "127.0.0.1");
-    EXPECT_EQ(dialog->draft().Link.ZephSimulationPort, 4000);
-    EXPECT_TRUE(dialog->draft().Link.ZephUseTCP);
+    const Connection& link = dialog->draft().Link;
+    EXPECT_EQ(std::tie(link.ZephAdapterName, link.ZephAdapterIP, link.ZephSimulationPort, link.ZephUseTCP),
+              std::make_tuple("Local", "127.0.0.1", 4000, true));
 }
 
-TEST_F(OptionsDialog, AColorThatWasNotChosenStays) {
+TEST_F(OptionsDialog, AnAdapterShowsItsAddressAndAWrongPortLeadsToItsField) {
+    connection = {"Gone", "127.0.0.1", 0, false, false};
     open();
-    click("cmdToolHandleColor");  // the color dialog is left without a choice
-    EXPECT_EQ(find<QPushButton>("cmdToolHandleColor")->text(), "#FF0000");
-    picked = 0xFF0000;  // blue stands highest
-    click("cmdToolHandleColor");
-    EXPECT_EQ(find<QPushButton>("cmdToolHandleColor")->text(), "#0000FF");
-}
-
-TEST_F(OptionsDialog, AWrongPortLeadsToItsField) {
-    settings.LastOptsTab = 1;
-    connection.ZephSimulationPort = 0;
-    open();
-    ASSERT_TRUE(QTest::qWaitForWindowActive(dialog.get()));
+    ASSERT_TRUE(QTest::qWaitForWindowActive(dialog));
     click("cmdOK");
     EXPECT_TRUE(dialog->isVisible());
-    ASSERT_EQ(host.boxes.size(), 1u);
-    EXPECT_EQ(host.boxes[0].title, "Qen Visualizer-Port Error");
+    EXPECT_EQ(host.boxes.size(), 1u);
     EXPECT_EQ(find<QTabWidget>("tabOptions")->currentIndex(), 5);
     EXPECT_EQ(QApplication::focusWidget(), find<QLineEdit>("txtZephPort"));
-    QTest::keyClicks(QApplication::focusWidget(), "65535");
-    click("cmdOK");
-    EXPECT_TRUE(accepted());
-    EXPECT_EQ(dialog->draft().Settings.SimulationPort, 65535);
-}
 
-TEST_F(OptionsDialog, AnAdapterShowsItsAddress) {
-    connection.ZephAdapterName = "Gone";
-    connection.ZephAdapterIP = "127.0.0.1";
-    open();
-    EXPECT_EQ(find<QComboBox>("cmbAdapter")->count(), 3);
-    EXPECT_EQ(find<QComboBox>("cmbAdapter")->currentIndex(), -1);
     EXPECT_EQ(find<QComboBox>("cmbAdapter")->placeholderText(), "Gone");
     EXPECT_EQ(find<QLabel>("lblLocalIP")->text(), "IP address: 127.0.0.1");
-    find<QTabWidget>("tabOptions")->setCurrentIndex(5);
     const auto ground = [this] { return find<QLabel>("lblLocalIP")->grab().toImage().pixelColor(4, 4); };
     const QColor usual = ground();
     choose("cmbAdapter", "Spare");
@@ -148,84 +130,56 @@ TEST_F(OptionsDialog, AnAdapterShowsItsAddress) {
     EXPECT_GT(ground().red(), 2 * ground().green());
     choose("cmbAdapter", "Stage");
     EXPECT_EQ(ground(), usual);
+    QTest::keyClicks(find<QLineEdit>("txtZephPort"), "65535");
+    click("cmdOK");
+    EXPECT_TRUE(accepted());
 }
 
-TEST_F(OptionsDialog, CancelAndResetGiveNoDraft) {
-    open();
-    find<QCheckBox>("chkConfirmDeletes")->toggle();
-    click("cmdCancel");
-    EXPECT_FALSE(accepted());
-    EXPECT_FALSE(dialog->wasReset());
+TEST_F(OptionsDialog, StoresAtOnceWhatWasAccepted) {
+    connection.ZephPortOpen = true;
+    machine.pop_back();
+    const OptionsOutcome outcome = edit([this] {
+        EXPECT_EQ(find<QComboBox>("cmbAdapter")->count(), 2);  // listed anew
+        find<QCheckBox>("chkUseTCP")->setChecked(true);
+        find<QCheckBox>("chkConfirmDeletes")->setChecked(false);
+        click("cmdOK");
+    });
+    EXPECT_EQ(outcome, OptionsOutcome::Stored);
+    EXPECT_FALSE(settings.ConfirmDeletes);
+    EXPECT_TRUE(connection.ZephUseTCP);  // for the rest of this run
+    EXPECT_TRUE(connection.ZephPortOpen);
+    EXPECT_EQ(store.get("Confirm Deletes"), "False");
+    EXPECT_EQ(store.get("ShutDownTime"), "(absent)");
+    EXPECT_EQ(host.boxes.size(), 1u);
+}
 
-    open();
+TEST_F(OptionsDialog, AResetReachesStoreSettingsAndConnection) {
+    settings.ConfirmDeletes = false;
+    settings.RecentFiles[0] = "/a.zee";
+    connection.ZephSimulationPort = 4000;
+    write();
+    const ZephSettings before = settings;
+    const auto cancel = [this] {
+        find<QCheckBox>("chkEditInColor")->toggle();
+        click("cmdCancel");
+    };
+    EXPECT_EQ(edit(cancel), OptionsOutcome::Kept);
+    EXPECT_EQ(settings, before);
     host.answers = {BoxAnswer::Cancel, BoxAnswer::Ok};
-    click("cmdReset");
-    EXPECT_TRUE(dialog->isVisible());
-    click("cmdReset");
-    EXPECT_FALSE(dialog->isVisible());
-    EXPECT_TRUE(dialog->wasReset());
-    EXPECT_EQ(resets, 1);
+    const auto resetTwice = [this] {
+        click("cmdReset");
+        EXPECT_TRUE(dialog->isVisible());
+        click("cmdReset");
+    };
+    EXPECT_EQ(edit(resetTwice), OptionsOutcome::Reset);
+    EXPECT_TRUE(settings.ConfirmDeletes);
+    EXPECT_EQ(settings.RecentFiles[0], "");
+    EXPECT_EQ(connection.ZephSimulationPort, 30303);
+    EXPECT_EQ(store.get("Confirm Deletes"), "(absent)");
+    EXPECT_EQ(store.get("CB Band Qty"), "3");
     const std::string asked = "Qen Visualizer-Reset Options to Defaults?|Are you sure you want to reset all options to "
                               "defaults?\r\nNote: This operation will reset your entire environment\r\nincluding "
                               "editor colors, recent files, toolbar locations, etc\n";
     EXPECT_EQ(host.boxTexts(),
               asked + asked + "Qen Visualizer-Reset Options to Defaults|All options reset to defaults");
-}
-
-namespace {
-
-// Opens the dialog as the menu does and works it from inside its own event loop.
-OptionsOutcome editOptions(SettingsRig& rig, const std::function<void(frmZephOptions&)>& work) {
-    QTimer::singleShot(0, [&] {
-        auto* dialog = dynamic_cast<frmZephOptions*>(QApplication::activeModalWidget());
-        ASSERT_NE(dialog, nullptr);
-        work(*dialog);
-        if (dialog->isVisible()) dialog->reject();
-    });
-    return ZephEditOptions(rig.context, nullptr, rig.settings, rig.connection, rig.adapters);
-}
-
-void clickIn(frmZephOptions& dialog, const char* name) {
-    QTest::mouseClick(dialog.findChild<QPushButton*>(name), Qt::LeftButton);
-}
-
-}  // namespace
-
-TEST(EditOptions, StoresAtOnceWhatWasAccepted) {
-    SettingsRig rig;
-    ASSERT_TRUE(rig.read());
-    rig.connection.ZephPortOpen = true;
-    const OptionsOutcome outcome = editOptions(rig, [](frmZephOptions& dialog) {
-        EXPECT_EQ(dialog.findChild<QComboBox*>("cmbAdapter")->count(), 3);  // listed anew
-        dialog.findChild<QCheckBox*>("chkUseTCP")->setChecked(true);
-        dialog.findChild<QCheckBox*>("chkConfirmDeletes")->setChecked(false);
-        clickIn(dialog, "cmdOK");
-    });
-    EXPECT_EQ(outcome, OptionsOutcome::Stored);
-    EXPECT_FALSE(rig.settings.ConfirmDeletes);
-    EXPECT_TRUE(rig.connection.ZephUseTCP);  // for the rest of this run
-    EXPECT_TRUE(rig.connection.ZephPortOpen);
-    EXPECT_EQ(rig.store.get("Confirm Deletes"), "False");
-    EXPECT_EQ(rig.store.get("ShutDownTime"), "(absent)");
-    ASSERT_EQ(rig.host.boxes.size(), 1u);
-    EXPECT_EQ(rig.host.boxes[0].title, "Qen Visualizer-Port Changed");
-}
-
-TEST(EditOptions, AResetReachesStoreSettingsAndConnection) {
-    SettingsRig rig;
-    ASSERT_TRUE(rig.read());
-    rig.settings.ConfirmDeletes = false;
-    rig.settings.RecentFiles[0] = "/a.zee";
-    rig.connection.ZephSimulationPort = 4000;
-    rig.write();
-    const ZephSettings before = rig.settings;
-    EXPECT_EQ(editOptions(rig, [](frmZephOptions& dialog) { clickIn(dialog, "cmdCancel"); }), OptionsOutcome::Kept);
-    EXPECT_EQ(rig.settings, before);
-    rig.host.answers = {BoxAnswer::Ok};
-    EXPECT_EQ(editOptions(rig, [](frmZephOptions& dialog) { clickIn(dialog, "cmdReset"); }), OptionsOutcome::Reset);
-    EXPECT_TRUE(rig.settings.ConfirmDeletes);
-    EXPECT_EQ(rig.settings.RecentFiles[0], "");
-    EXPECT_EQ(rig.connection.ZephSimulationPort, 30303);
-    EXPECT_EQ(rig.store.get("Confirm Deletes"), "(absent)");
-    EXPECT_EQ(rig.store.get("CB Band Qty"), "3");
 }
