@@ -61,10 +61,7 @@ public:
     void showPressedDrawButton() override { pressed = editor.PressedDrawButton; }
     void showModeButtons() override { modeButton = editor.ZephChangeToggle; }
     void CheckEnable(bool) override { calls.push_back("enable"); }
-    bool enterSimulation() override {
-        editor.ZephUIState = kStateSimulation;
-        return true;
-    }
+    bool enterSimulation() override { return false; }
     void ZephCleanUpAfterSimulation() override {}
     long count(const std::string& call) const { return std::ranges::count(calls, call); }
 

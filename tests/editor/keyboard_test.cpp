@@ -63,13 +63,4 @@ TEST(Keyboard, LeavesKeysToOthers) {
     EXPECT_EQ(answer(rig, {kKeyTab}, {true, true}), KeyAnswer{});    // Tab is moving the list already
     EXPECT_EQ(answer(rig, {kKeyApps}, {}, false), KeyAnswer{});
     EXPECT_EQ(answer(rig, {kKeyV, true}), KeyAnswer{});  // the clipboard is empty
-    rig.simulation->FixtureCount = 0;
-    EXPECT_EQ(answer(rig, {kKeyTab}), KeyAnswer{});
-}
-
-TEST(Keyboard, TabWrapsThroughTheList) {
-    EXPECT_EQ(nextListRow(-1, 3, false), 0);
-    EXPECT_EQ(nextListRow(2, 3, false), 0);
-    EXPECT_EQ(nextListRow(-1, 3, true), 2);
-    EXPECT_EQ(nextListRow(0, 3, true), 2);
 }

@@ -27,14 +27,11 @@ using Strings = std::vector<std::string>;
 TEST_F(Communications, UdpBindsTheChosenAdapterOnceAndTunesTheBufferOnEachCall) {
     connection.ZephAdapterName = "eth0";
     EXPECT_TRUE(setUp());
-    EXPECT_TRUE(connection.ZephPortOpen);
-    EXPECT_EQ(simulationActiveText(false, ip, port), "UDP Simulation active on 192.168.1.20 (30303)");
     connection.ZephSimulationPort = 5;  // takes effect with the next start of the program
     EXPECT_TRUE(setUp());
     EXPECT_EQ(simulationActiveText(false, ip, port), "UDP Simulation active on 192.168.1.20 (30303)");
     EXPECT_EQ(socket.calls, (Strings{"bind 192.168.1.20 30303", "buffer 2097152", "buffer 2097152"}));
     EXPECT_EQ(log, Strings(2, "Receive buffer: 2097152 bytes asked for, 212992 granted"));
-    EXPECT_EQ(host.boxTexts(), "");
 }
 
 TEST_F(Communications, AnUnknownAdapterFallsBackToLocalAndTcpListensOnAllAddresses) {

@@ -92,17 +92,13 @@ TEST_F(Parser, ABadFrameEndsTheCallAndTheNextFrameWaitsForTheNextOne) {
         std::string text;
         List applied;  // of the bad frame itself
     } rows[] = {
-        {"empty", kSoh + kEot, {}},
         {"length too large", kSoh + "001" + "0037" + kOne + kEot, {}},
-        {"length with a sign", kSoh + "001" + "+036" + kOne + kEot, {}},
         {"count above the payloads", frame(3, one + two), {1, 2}},
         {"short address", frame(2, one + two.substr(0, 14)), {1}},
-        {"cmd no number", frame(3, one + "x0" + two.substr(2) + circuit(3)), {1}},
         {"duration with two points", frame(2, one.substr(0, 15) + "00.1.000" + "100000" + two), {}},
         {"name cut short", frame(2, one + "0000000000000060050.000000100arch_"), {1}},
         {"nothing behind a named payload", frame(2, one + "0000000000000000050.000000100"), {1}},
         {"short dump", frame(2, one + "01000050700000"), {1}},
-        {"dump with a bad digit", frame(3, one + "010000507000002FF0G" + two), {1}},
     };
     for (const auto& row : rows) {
         EXPECT_EQ(circuitsOf(row.text + frame(1, circuit(9))), row.applied) << row.name;
@@ -123,16 +119,11 @@ TEST_F(Parser, WhatIsNoFaultDoesNotEndTheCall) {
     } rows[] = {
         {"count 000", frame(0, ""), {9}},
         {"more payloads than counted", frame(1, one + two), {1, 9}},
-        {"no operation between", frame(3, one + "9900" + two), {1, 2, 9}},
-        {"unknown name", frame(3, one + "0000000000000060050.000000100arch_2" + two), {1, 2, 9}},
-        {"its timing unread", frame(3, one + "000000000000006xxxxxxxxyyyzzzarch_2" + two), {1, 2, 9}},
+        {"unknown name, its timing unread", frame(3, one + "000000000000006xxxxxxxxyyyzzzarch_2" + two), {1, 2, 9}},
         {"unknown cmd", frame(3, one + "02" + two.substr(2) + circuit(3)), {1, 9}},
-        {"universe 0", frame(2, "010000007000001FF" + two), {2, 9}},
-        {"unit 241", frame(2, "010000001241001FF" + two), {2, 9}},
     };
     for (const auto& row : rows)
         EXPECT_EQ(circuitsOf(row.text + frame(1, circuit(9))), row.applied) << row.name;
-    EXPECT_FALSE(stream.Dumps.ZephDmxDumpPending || stream.Dumps.ZephControllerDumpPending);
 }
 
 TEST_F(Parser, AnUnknownSubDrivesTheChannelWithTheTimingBeforeUntilTheCountIsUsedUp) {
@@ -163,11 +154,7 @@ TEST_F(Parser, ConvertsDurationsAndLevelsExactly) {
 TEST_F(Parser, ReadsTheColumnsThatTheTableNames) {
     // A variant of sub 01 with the levels before the duration.
     setup.PacketParms[packetIndex(0, 1)] = {30, 22, 9, 16, 3, 19, 3};
-    EXPECT_EQ(commandsOf(frame(2, "000100100002005"
-                                  "100"
-                                  "050"
-                                  "00001.500" +
-                                      circuit(6))),
+    EXPECT_EQ(commandsOf(frame(2, "00010010000200510005000001.500" + circuit(6))),
               (std::vector<ZephChannelCommand>{{{0, 1, 1, 0, 2, 5}, {15, 100, 50}},
                                                {{0, 0, 1, 0, 2, 6}, kOneCommand.Timing}}));
 }

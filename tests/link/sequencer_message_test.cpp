@@ -48,8 +48,7 @@ TEST(SequencerMessage, ReachesWhoeverListensAndSaysSoWhenNobodyDoes) {
     QLocalSocket* const client = server.nextPendingConnection();
     std::string arrived;
     std::optional<std::string> text;
-    while (!(text = takeSequencerRecord(arrived)) && client->waitForReadyRead(5000)) {
+    while (!(text = takeSequencerRecord(arrived)) && client->waitForReadyRead(5000))
         arrived += client->readAll().toStdString();
-    }
     EXPECT_EQ(text, "15<SEQVIS>START");
 }

@@ -21,7 +21,6 @@ protected:
         socket.dataArrival = [this] { Winsock1_DataArrival(true, false, socket, failures, receive); };
         socket.connectionRequest = [this](std::int64_t requestID) {
             Winsock1_ConnectionRequest(requestID, socket, host, failures);
-            ++requests;
         };
     }
 
@@ -55,7 +54,6 @@ protected:
     RecordingHost host;
     CollectingFailures failures;
     ReceiveState receive;
-    int requests = 0;
 };
 
 }  // namespace
@@ -101,8 +99,7 @@ TEST_F(RealSocket, ATakenPortIsNamedAsSuch) {
     listener.Listen(0);
     EXPECT_THROW(second.Listen(listener.LocalPort()), PortTaken);
     EXPECT_THROW(second.Bind(0, "192.0.2.1"), Failure);  // no address of this machine
-    EXPECT_THROW(second.Bind(0, "nonsense"), Failure);
-    second.Bind(0, "127.0.0.1");  // a failure does not spoil the socket
+    second.Bind(0, "127.0.0.1");                         // a failure does not spoil the socket
     EXPECT_NE(second.State(), 0);
 }
 
@@ -141,7 +138,6 @@ TEST_F(RealSocket, TheNewestTcpClientWins) {
         next.connectToHost(QHostAddress::LocalHost, listening);
         return !next.waitForConnected(500);
     }));
-    EXPECT_EQ(requests, 2);
     // Entering simulation again is no failure: the socket counts as open until the program ends.
     EXPECT_NE(socket.State(), 0);
     EXPECT_EQ(socket.SetReceiveBuffer(kReceiveBufferBytes).systemError, 0);
