@@ -83,7 +83,7 @@ TEST(CheckEnable, FollowsStateAndSelection) {
     for (const auto& row : rows) {
         EditorRig rig;
         rig.select(row.state, row.fixture);
-        rig.simulation->Fixtures[row.fixture].Locked = row.fixtureLocked;
+        if (row.fixtureLocked) rig.simulation->Fixtures[row.fixture].Locked = true;
         rig.simulation->Props[1].Locked = row.propLocked;
         CommandStates states;
         CheckEnable(false, rig.inputs(), states);
