@@ -21,13 +21,6 @@ TEST(OptionsLogic, ListsAreWordedAsTheirSettingsAre) {
               "6 Hours=360");
     EXPECT_EQ(worded(ZephOptionItems(&ZephSettings::OnStartup)),
               "Do Nothing=0, Show Open File Dialog=1, Automatically Open Last File=2");
-    EXPECT_EQ(worded(ZephAssumeNewObjectItems()), "Ask=0, Always=1");
-    for (const auto& [field, count, last] : {std::tuple{&ZephSettings::BulbSpacing, 65, "64=64"},
-                                             {&ZephSettings::FloodOpacity, 20, "100 %=100"},
-                                             {&ZephSettings::BulbShape, 11, "Pixel Bulb=11"}}) {
-        EXPECT_EQ(ZephOptionItems(field).size(), count) << last;
-        EXPECT_THAT(worded(ZephOptionItems(field)), testing::EndsWith(last));
-    }
     EXPECT_THROW(ZephOptionItems(&ZephSettings::Left), Failure);
 }
 

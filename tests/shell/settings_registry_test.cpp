@@ -1,7 +1,6 @@
 #include "shell/settings_registry.h"
 #include "shell/tool_bands.h"
 #include "tests/shell/settings_rig.h"
-#include "util/random_source.h"
 
 #include <QRegularExpression>
 
@@ -121,33 +120,6 @@ TEST(SettingsRegistry, DamageCostsOneValueAndIsReported) {
             EXPECT_LT(report.description.size(), 200u);
             EXPECT_EQ(report.description.find_first_of("\r\n\x1b"), std::string::npos);
         }
-    }
-}
-
-// Whatever the store holds, what comes out is a record that the program can work with.
-TEST(SettingsRegistry, RandomContentGivesNumbersWithinTheirRanges) {
-    const std::string alphabet("0123456789+-. TrueFalse\\/<>base@(),\"%&\0\n\xc3\xa9\xff", 42);
-    SeededRandom random(2024);
-    const auto any = [&](int below) { return static_cast<std::size_t>(random.next() * below); };
-    for (int round = 0; round < 150; ++round) {
-        SettingsRig rig;
-        rig.write();
-        for (auto& [place, text] : rig.store.values) {
-            if (any(4) == 0) continue;
-            text.clear();
-            for (std::size_t length = any(12); length > 0; --length)
-                text.push_back(alphabet[any(static_cast<int>(alphabet.size()))]);
-        }
-        ASSERT_TRUE(rig.read());
-        ZephInitializeFromRegistryCoolbar(rig.store, rig.failures);
-        rig.write();
-        for (const Stored& stored : firstRun()) {
-            if (!stored.least) continue;
-            const int value = std::stoi(rig.store.get(stored.name));
-            EXPECT_GE(value, *stored.least) << stored.name;
-            EXPECT_LE(value, stored.most.value_or(value)) << stored.name;
-        }
-        EXPECT_EQ(rig.readBack(), rig.settings);
     }
 }
 
