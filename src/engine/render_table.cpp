@@ -367,12 +367,10 @@ bool buildTables(RenderBuildContext& context) {
 }  // namespace
 
 void ZephBuildRenderTable(RenderBuildContext context) try {
-    context.host.setBusyPointer(true);
+    const BusyPointer busy(context.host);
     buildTables(context);
-    context.host.setBusyPointer(false);
 } catch (...) {
     eraseRenderTables(context.tables);
-    context.host.setBusyPointer(false);
     reportCaughtFailure(context.failures, kModule, __func__, __LINE__);
 }
 

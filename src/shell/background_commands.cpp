@@ -15,9 +15,11 @@ void applyBackground(const ZephBackground& edited, Program& program, SimulationF
     ZephSimulation& simulation = *program.simulation;
     const bool resized = ZephTakeBackground(edited, simulation);
     Host& host = program.seams.host;
-    host.setBusyPointer(true);
-    installBackground(loadBackground(simulation, program.seams.programFolder, BackgroundTexts::Change, host), program);
-    host.setBusyPointer(false);
+    {
+        const BusyPointer busy(host);
+        installBackground(loadBackground(simulation, program.seams.programFolder, BackgroundTexts::Change, host),
+                          program);
+    }
     program.editor.ZephSelection = {};
     face.ZephDeselectflg();
     host.setStatusPanel(2, ZephUpdateStatusBarForUIState(simulation, program.editor, false));

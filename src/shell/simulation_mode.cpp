@@ -4,6 +4,7 @@
 
 namespace {
 
+constexpr std::string_view kModule = "modZephEditorFunctions";
 constexpr std::string_view kBackwardClock = "Can not enter simulation mode:  Time is running backwards.";
 
 void refuseBackwardClock(Host& host) {
@@ -11,11 +12,9 @@ void refuseBackwardClock(Host& host) {
         boxTitle("-Error:  Reboot Required"),
         std::string(kBackwardClock) +
             "\r\n\r\nThe visualizer can not enter simulation mode since Windows is reporting that time is running "
-            "backwards.  This "
-            "is usually caused by not having rebooted the computer in over 24 days.\r\n\r\n"
-            "Please save your work and then re-boot your computer.  Some computers when shut down do not actually shut "
-            "down "
-            "but enter sleep mode.  This is not the same as a reboot.",
+            "backwards.  This is usually caused by not having rebooted the computer in over 24 days.\r\n\r\n"
+            "Please save your work and then re-boot your computer.  Some computers when shut down do not actually "
+            "shut down but enter sleep mode.  This is not the same as a reboot.",
         BoxIcon::Critical);
 }
 
@@ -96,10 +95,14 @@ bool startOpenGLEngine(Program& program, SimulationFace& face) {
     return true;
 }
 
+// Memory that runs out on the way is a failed entry like any other.
+bool startEngineOfSetting(Program& program, SimulationFace& face) try {
+    return program.rendersOpenGL() ? startOpenGLEngine(program, face) : startStandardEngine(program, face);
+}
+ZEPH_GUARD(program.failures, kModule, false)
+
 bool startEngine(Program& program, SimulationFace& face) {
-    const bool started =
-        program.rendersOpenGL() ? startOpenGLEngine(program, face) : startStandardEngine(program, face);
-    if (started) return true;
+    if (startEngineOfSetting(program, face)) return true;
     // Every failed entry leaves an editor that is whole.
     program.glSurface.release();
     face.closeRenderWindow();
@@ -137,10 +140,8 @@ void mnuSimulationMode_Click(Program& program, SimulationFace& face) {
 bool ProgramModes::enterSimulation() {
     clearLevelDumps(program_.receive.Stream.Dumps);
     program_.receive.Stream.ZephStackBuffer.clear();  // only what arrives from now on counts
-    program_.seams.host.setBusyPointer(true);
-    const bool started = startEngine(program_, face_);
-    program_.seams.host.setBusyPointer(false);
-    return started;
+    const BusyPointer busy(program_.seams.host);
+    return startEngine(program_, face_);
 }
 
 void ProgramModes::ZephCleanUpAfterSimulation() {

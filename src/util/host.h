@@ -25,5 +25,17 @@ public:
     virtual void pumpEvents() = 0;
 };
 
+// The busy pointer for as long as it lives, whatever way the work ends.
+class BusyPointer {
+public:
+    explicit BusyPointer(Host& host) : host_(host) { host_.setBusyPointer(true); }
+    ~BusyPointer() { host_.setBusyPointer(false); }
+    BusyPointer(const BusyPointer&) = delete;
+    BusyPointer& operator=(const BusyPointer&) = delete;
+
+private:
+    Host& host_;
+};
+
 // The program's name followed directly by the suffix, as every message box is titled.
 std::string boxTitle(std::string_view suffix);

@@ -16,9 +16,11 @@ std::optional<PickedPicture> cmdOpen_Click(const PicturePicker& pick, const QStr
                                            Host& host) {
     const QString file = pick(QObject::tr("Load File"), folder, over);
     if (file.isEmpty()) return std::nullopt;
-    host.setBusyPointer(true);
-    QImage picture = loadPicture(file.toStdString());
-    host.setBusyPointer(false);
+    QImage picture;
+    {
+        const BusyPointer busy(host);
+        picture = loadPicture(file.toStdString());
+    }
     if (picture.isNull()) {
         tellBadPicture(host);
         return std::nullopt;
