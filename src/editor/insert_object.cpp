@@ -26,10 +26,6 @@ constexpr InsertKind kProp{kLoadPropFile, &ZephSettings::LastPropFile, kUndoInse
                            "The prop you loaded had one or more channels assigned to the fixtures attached to it.\r\n"
                            "Do you want to keep these channel assignments?"};
 
-bool insertable(const ModeContext& context) {
-    return context.simulation.SimulationOpen && context.editor.ZephUIState != kStateSimulation;
-}
-
 void makeBulbs(int before, const EditContext& context) {
     const ZephSimulation& simulation = context.modes.simulation;
     for (int fixture = before + 1; fixture <= simulation.FixtureCount; ++fixture)
@@ -94,7 +90,7 @@ void tellInserted(const ModeContext& context) {
 
 void mnuInsertFixture_Click(const EditContext& context) try {
     const ModeContext& modes = context.modes;
-    if (!insertable(modes) || !fixtureFits(modes.simulation, modes.host)) return;
+    if (!editable(modes) || !fixtureFits(modes.simulation, modes.host)) return;
     if (bringIn(kFixture, context)) {
         showInserted(kStateSelectFixture, modes.simulation.FixtureCount, modes);
         tellInserted(modes);
@@ -105,7 +101,7 @@ ZEPH_GUARD(context.modes.failures, kModule, )
 
 void mnuInsertProp_Click(const EditContext& context) try {
     const ModeContext& modes = context.modes;
-    if (!insertable(modes) || !propFits(modes.simulation, modes.host) || !fixtureFits(modes.simulation, modes.host)) {
+    if (!editable(modes) || !propFits(modes.simulation, modes.host) || !fixtureFits(modes.simulation, modes.host)) {
         return;
     }
     if (bringIn(kProp, context)) {

@@ -7,11 +7,6 @@ namespace {
 
 constexpr std::string_view kModule = "frmZephMain";
 
-// The document of a running simulation is frozen, and without one there is nothing to choose a tool for.
-bool editable(const ModeContext& context) {
-    return context.simulation.SimulationOpen && context.editor.ZephUIState != kStateSimulation;
-}
-
 void deselect(const ModeContext& context) {
     context.face.ZephDeselectflg();
     context.editor.ZephSelection.Object = 0;

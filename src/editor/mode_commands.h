@@ -1,5 +1,4 @@
-// The commands that lead to another mode. Each tests for itself whether it may act, since keys and the list reach it
-// past the menus.
+// The commands that lead to another mode.
 #pragma once
 
 #include "editor/mode_switch.h"

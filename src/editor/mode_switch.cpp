@@ -39,6 +39,10 @@ void draw(bool fromSimulation, const ModeContext& context) {
 
 }  // namespace
 
+bool editable(const ModeContext& context) noexcept {
+    return context.simulation.SimulationOpen && context.editor.ZephUIState != kStateSimulation;
+}
+
 void ZephSwitchMode(int requestedMode, int tool, const ModeContext& context) try {
     ZephEditorState& editor = context.editor;
     context.face.restoreIfMinimized();

@@ -44,6 +44,10 @@ struct ModeContext {
     FailureReport& failures;
 };
 
+// Whether a command may touch the document: the one of a running simulation is frozen, and there may be none. Each
+// command asks for itself, since keys and the list reach it past the menus.
+bool editable(const ModeContext& context) noexcept;
+
 // requestedMode: kStateSimulation, kStateSelectProp, kStateSelectFixture or kModeDrawing; any other value changes the
 // tool only. tool: 1..9, stored whatever the mode. A simulation that cannot be entered ends in kStateSelectFixture.
 void ZephSwitchMode(int requestedMode, int tool, const ModeContext& context);

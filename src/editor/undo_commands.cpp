@@ -12,7 +12,7 @@ void tell(std::string_view text, const ModeContext& context) {
 }  // namespace
 
 void mnuUndo_Click(const EditContext& context) try {
-    if (context.stores.UndoPosition < 1) return;
+    if (!editable(context.modes) || context.stores.UndoPosition < 1) return;
     bool restoreProperties = false;  // always comes back false, so no dialog follows
     static_cast<void>(ZephUndoLastAction(context.undo, context.modes.simulation, context.stores, restoreProperties));
     CleanUpInProgressFixture(context.modes.editor.ZephInProgressFixture);
@@ -21,7 +21,7 @@ void mnuUndo_Click(const EditContext& context) try {
 ZEPH_GUARD(context.modes.failures, kModule, )
 
 void mnuRedo_Click(const EditContext& context) try {
-    if (context.stores.RedoPosition < 1) return;
+    if (!editable(context.modes) || context.stores.RedoPosition < 1) return;
     bool restoreProperties = false;
     static_cast<void>(ZephRedoLastAction(context.undo, context.modes.simulation, context.stores, restoreProperties));
     tell("Redo of last action", context.modes);
