@@ -64,7 +64,11 @@ void frmZephMain::connectControls() {
 
 void frmZephMain::placeAtStart() {
     setMinimumSize(kLeastWidthTwips / TwipsPerPixelX, kLeastHeightTwips / TwipsPerPixelY);
-    const QRect place = ZephWindowPlace(program_.settings, QGuiApplication::primaryScreen()->availableGeometry());
+    const ZephSettings& settings = program_.settings;
+    const QScreen* screen =
+        QGuiApplication::screenAt(QPoint(settings.Left / TwipsPerPixelX, settings.Top / TwipsPerPixelY));
+    if (screen == nullptr) screen = QGuiApplication::primaryScreen();  // the one that it stood on has gone
+    const QRect place = ZephWindowPlace(settings, screen->availableGeometry());
     move(place.topLeft());
     resize(place.size());
 }

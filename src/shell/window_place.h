@@ -5,8 +5,8 @@
 
 #include <QRect>
 
-// Where the window is to stand, in pixels. available: the part of the screens that windows may cover; a window that
-// would lie outside it, since a screen has gone, is moved and shrunk into it.
+// Where the window is to stand, in pixels. available: the part of its screen that windows may cover; a window that
+// would lie outside it is moved and shrunk into it.
 QRect ZephWindowPlace(const ZephSettings& settings, const QRect& available);
 
 // Keeps the place for the next run. place: of the window when it is neither maximised nor minimised, pixels.
