@@ -20,8 +20,7 @@ struct ZephListEntry {
 // document is open.
 std::vector<ZephListEntry> ZephListIndex(const ZephSimulation& simulation, const ZephEditorState& editor);
 
-// False where the list does not take clicks: in a running
-// simulation, while a stroke is under way and without a document.
+// False where the list does not take clicks: in a running simulation, while a stroke is under way, without a document.
 bool listTakesClicks(const ZephSimulation& simulation, const ZephEditorState& editor) noexcept;
 
 // Selects a fixture of the list, locked or not. From Drawing it goes to Select Fixture first. Nothing where the list

@@ -6,11 +6,9 @@ namespace {
 
 constexpr std::string_view kSaveFixtureQuestion =
     " can save fixtures with or without the associated channel data. \r\nSaving the channel data along with the "
-    "fixture "
-    "allows you to more easily use this fixture in other simulations that you create with the program.  However, if "
-    "you "
-    "are saving this fixture to share with others, you should remove the channel data since it will not match with "
-    "others' configurations.\r\n\r\nShould channel data be saved with this fixture?";
+    "fixture allows you to more easily use this fixture in other simulations that you create with the program.  "
+    "However, if you are saving this fixture to share with others, you should remove the channel data since it will "
+    "not match with others' configurations.\r\n\r\nShould channel data be saved with this fixture?";
 constexpr std::string_view kSavePropQuestion =
     " can save props with or without the associated channel data. \r\nSaving fixture channel data along with the prop "
     "allows you to more easily use this prop in other simulations that you create with the program.  However, if you "

@@ -25,7 +25,7 @@ CommandInputs commandInputs(const Program& program) {
 
 }  // namespace
 
-void frmZephMain::runCommand(Command command) {
+void frmZephMain::runCommand(Command command) try {
     takeIntensity();  // no command, least of all a save, may find the slider ahead of the document
     switch (command) {
     case Command::FileNew:
@@ -79,6 +79,7 @@ void frmZephMain::runCommand(Command command) {
     }
     showPressedDrawButton();  // the control has changed itself at the click
 }
+ZEPH_GUARD(program_.failures, kModule, )
 
 bool frmZephMain::openFile(const QString& path, bool quiet) {
     setEditorFile(path.toStdString(), *program_.simulation);
