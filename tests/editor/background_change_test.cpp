@@ -13,20 +13,15 @@ struct BackgroundChange : testing::Test {
     BackgroundChange() {
         simulation->Background = {0, "", 100, 30, 60};  // twips
         simulation->FixtureCount = 2;
-        for (int fixture = 1; fixture <= 2; ++fixture) {
-            ZephFixture& record = simulation->Fixtures[fixture];
-            record.BulbSize = 4;
-            record.PointCount = 4;
-            const int points[][2] = {{1, 1}, {3, 7}, {-1, -5}, {0, 0}, {9, 9}};  // the last past the count
-            for (int p = 1; p <= 5; ++p)
-                record.DrawPoints[p] = {kPointLine, points[p - 1][0], points[p - 1][1]};
-        }
+        ZephFixture& fixture = simulation->Fixtures[1];
+        fixture.BulbSize = 4;
+        for (const auto& [x, y] : {std::pair{1, 1}, {3, 7}, {-1, -5}, {0, 0}, {9, 9}})
+            fixture.DrawPoints[++fixture.PointCount] = {kPointLine, x, y};
+        --fixture.PointCount;  // the last is past the count
+        simulation->Fixtures[2] = fixture;
     }
     bool take(std::int32_t widthTwips, std::int32_t heightTwips) {
-        ZephBackground edited = simulation->Background;
-        edited.EditorWidthTwips = widthTwips;
-        edited.EditorHeightTwips = heightTwips;
-        return ZephTakeBackground(edited, *simulation);
+        return ZephTakeBackground({0, "", 100, widthTwips, heightTwips}, *simulation);
     }
     std::string points(int fixture) {
         std::string text;
@@ -57,9 +52,7 @@ TEST_F(BackgroundChange, PointsKeepTheirPlaceOnTheNewCanvas) {
     simulation->Background.EditorHeightTwips = -3;
     EXPECT_TRUE(take(2 * TwipsPerPixelX, 3 * TwipsPerPixelY));
     EXPECT_EQ(points(1), "4,0 8,12 -4,-6 0,0 9,9 ");
-}
-
-TEST(Scaling, IsExactAndSaturates) {
+    // Scaling is exact, and saturates.
     EXPECT_EQ(scaleHalfEven(35, 9, 30), 10);  // 10.5, which 35 x 0.3 need not be
     EXPECT_EQ(scaleHalfEven(-45, 9, 30), -14);
     EXPECT_EQ(scaleHalfEven(2147483647, 2, 1), 2147483647);

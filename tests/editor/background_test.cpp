@@ -52,13 +52,10 @@ QByteArray turnedPhoto() {
 
 }  // namespace
 
-TEST_F(Background, BrightnessIsTheFloorOfTheProduct) {
+TEST(Brightness, IsTheFloorOfTheProductAndStopsAtBlack) {
     // floor((100 - i) x -2.55), by hand; at 60 and 20 the product is whole and must not slip to the next number.
     for (const auto& [intensity, offset] : {std::pair{100, 0}, {99, -3}, {60, -102}, {50, -128}, {20, -204}, {0, -255}})
         EXPECT_EQ(brightnessOffset(intensity), offset) << intensity;
-}
-
-TEST_F(Background, DarkensEachByteAndStopsAtBlack) {
     QImage picture(37, 1, QImage::Format_RGB32);
     picture.fill(qRgb(0, 99, 250));
     for (const auto& [offset, expected] :

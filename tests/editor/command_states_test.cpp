@@ -28,6 +28,12 @@ const Commands kOfDocument{BackgroundProperties, FileSaveAs,   LoadQenReference,
 const Commands kOfFixtures{Select, SimulationMode, ItemTool, CreateNewItem};
 const Commands kOfSelection{Cut, CopyObject, DeleteObject, HomeObject};
 
+CommandStates check(const EditorRig& rig) {
+    CommandStates states;
+    CheckEnable(false, rig.inputs(), states);
+    return states;
+}
+
 Commands together(std::initializer_list<Commands> lists) {
     Commands all;
     for (const Commands& list : lists)
@@ -44,27 +50,19 @@ TEST(CheckEnable, WithoutADocumentOrFixturesThereIsLittleToOffer) {
     rig.editor.ZephClipboard.resize(3);
     rig.undo = {2, 2};
     rig.select(kStateSelectFixture, 1);
-    CommandStates states;
-    CheckEnable(false, rig.inputs(), states);
+    const CommandStates states = check(rig);
     EXPECT_EQ(offered(states), Commands{});
     for (const Command command : kAlways)
         EXPECT_TRUE(states[command].enabled) << commandRow(command).name;
     EXPECT_FALSE(states[Insert].enabled || states[Order].enabled || states[Toolbox].enabled);
     const EditorRig empty;
     empty.simulation->FixtureCount = 0;
-    CheckEnable(false, empty.inputs(), states);
-    EXPECT_EQ(offered(states), together({kTools, kOfDocument}));
+    EXPECT_EQ(offered(check(empty)), together({kTools, kOfDocument}));
 }
 
 TEST(CheckEnable, FollowsStateAndSelection) {
-    const struct {
-        const char* name;
-        int state;
-        int fixture;
-        bool fixtureLocked;
-        bool propLocked;
-        Commands besides;  // what is offered besides the tools and what any document with fixtures offers
-    } rows[] = {
+    // The last: what is offered besides the tools and what any document with fixtures offers.
+    const std::tuple<const char*, int, int, bool, bool, Commands> rows[] = {
         {"nothing selected", kStateSelectFixture, 0, false, false, {}},
         {"middle level", kStateSelectFixture, 1, false, false,
          together(
@@ -80,15 +78,14 @@ TEST(CheckEnable, FollowsStateAndSelection) {
         {"lone fixture among props", kStateSelectProp, 1, true, false, together({kOfSelection, {Lock}})},
         {"drawing", kStateDrawing, 1, false, false, kOfSelection},
     };
-    for (const auto& row : rows) {
+    for (const auto& [name, state, fixture, fixtureLocked, propLocked, besides] : rows) {
         EditorRig rig;
-        rig.select(row.state, row.fixture);
-        if (row.fixtureLocked) rig.simulation->Fixtures[row.fixture].Locked = true;
-        rig.simulation->Props[1].Locked = row.propLocked;
-        CommandStates states;
-        CheckEnable(false, rig.inputs(), states);
-        EXPECT_EQ(offered(states), together({kTools, kOfDocument, kOfFixtures, row.besides})) << row.name;
-        EXPECT_EQ(states[EditLocks].enabled, states[Lock].enabled || states[Unlock].enabled) << row.name;
+        rig.select(state, fixture);
+        if (fixtureLocked) rig.simulation->Fixtures[fixture].Locked = true;
+        rig.simulation->Props[1].Locked = propLocked;
+        const CommandStates states = check(rig);
+        EXPECT_EQ(offered(states), together({kTools, kOfDocument, kOfFixtures, besides})) << name;
+        EXPECT_EQ(states[EditLocks].enabled, states[Lock].enabled || states[Unlock].enabled) << name;
     }
 }
 
@@ -96,8 +93,7 @@ TEST(CheckEnable, ClipboardUndoAndNamesNeedSomethingToGiveBack) {
     EditorRig rig;
     rig.editor.ZephClipboard.resize(1);
     rig.undo = {1, 0};
-    CommandStates states;
-    CheckEnable(false, rig.inputs(), states);
+    CommandStates states = check(rig);
     EXPECT_TRUE(states[PasteObject].enabled);
     EXPECT_TRUE(states[Undo].enabled);
     EXPECT_FALSE(states[Redo].enabled);
@@ -107,7 +103,7 @@ TEST(CheckEnable, ClipboardUndoAndNamesNeedSomethingToGiveBack) {
     EXPECT_FALSE(states.band.chkNames);
     rig.undo = {0, 1};
     rig.editor.ZephUIState = kStateSimulation;
-    CheckEnable(false, rig.inputs(), states);
+    states = check(rig);
     EXPECT_FALSE(states[Undo].enabled || states[Redo].enabled);
 }
 
@@ -135,7 +131,7 @@ TEST(CommandTable, GivesNoKeyTwice) {
         EXPECT_TRUE(row.shortcut.empty() || keys.insert(row.shortcut).second) << row.name;
 }
 
-TEST(ToolBarTexts, NameTheLevelThatAMoveLeadsTo) {
+TEST(ToolBarTexts, TellTheLevelsTheStateAndTheBrightness) {
     EditorRig rig;
     EditToolBarTexts texts;
     rig.select(kStateSelectFixture, 1);
@@ -145,10 +141,7 @@ TEST(ToolBarTexts, NameTheLevelThatAMoveLeadsTo) {
     rig.editor.ZephUIState = kStateDrawing;
     SetEditToolBarTips(*rig.simulation, rig.editor, {}, texts);
     EXPECT_EQ(texts.ObjectProperties, "Fixture Properties");  // a state that selects nothing leaves it
-}
 
-TEST(ToolBarTexts, TellTheStateInPanelTwoAndTheBrightnessInTheBand) {
-    EditorRig rig;
     rig.simulation->Background.PicIntensity = 40;
     EXPECT_EQ(ZephSetOptionsToolbandStuff({}, *rig.simulation).sldIntensity, 40);
     const auto text = [&](int state, int fixture, bool suppress = false) {

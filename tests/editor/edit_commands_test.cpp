@@ -14,7 +14,7 @@ namespace {
 constexpr int kPx = TwipsPerPixelX;
 
 // The editor with everything that its commands take: a folder, and dialogs that give the next name of a script.
-struct EditCommands : testing::Test, FileDialogs, UndoFace {
+struct EditCommands : ModeRig, FileDialogs, UndoFace {
     bool chooseInput(const FileDialog&, std::string& fullPath) override {
         ++asked;
         fullPath = chosen;
@@ -55,10 +55,6 @@ struct EditCommands : testing::Test, FileDialogs, UndoFace {
         choose("pair.zpf", propFileText(*other, other->Props[1], kChannelChoiceYes, ""));
     }
 
-    EditorRig rig;
-    RecordingHost host;
-    CollectingFailures failures;
-    RecordingModeFace face{rig.editor};
     Folder folder;
     ZephSettings settings;
     ZephPathService paths{folder.path()};
@@ -67,7 +63,6 @@ struct EditCommands : testing::Test, FileDialogs, UndoFace {
     EditorFileContext files{settings, paths, host, failures, watcher};
     std::unique_ptr<ZephMasks> masks = std::make_unique<ZephMasks>();
     std::unique_ptr<ZephStaticBulbs> images = std::make_unique<ZephStaticBulbs>();
-    ModeContext modes{*rig.simulation, rig.editor, host, face, face, failures};
     UndoContext undo{files, rig.editor.ZephUIState, *this};
     EditContext context{modes, undo, stores, settings, *this, *masks, *images};
     std::string chosen;

@@ -73,3 +73,12 @@ public:
     std::int32_t highlighted = 0;
     bool listFails = false;
 };
+
+// The rig with that window around it.
+struct ModeRig : testing::Test {
+    EditorRig rig;
+    RecordingHost host;
+    CollectingFailures failures;
+    RecordingModeFace face{rig.editor};
+    ModeContext modes{*rig.simulation, rig.editor, host, face, face, failures};
+};

@@ -14,21 +14,19 @@ TEST(DimmingCurve, EveryChildSetsOneByteWhateverItsName) {
 }
 
 TEST(DimmingCurve, FailuresAreReportedInTheGivenWords) {
+    const std::string head = "<ZephDimCurve zephSaveFileVersion=\"1.5.0\"";
+    const std::string open = head + "><Dimming_Curve>";
+    const std::string close = "</Dimming_Curve></ZephDimCurve>";
     const std::string noBody = "Could Not load the dimming curve's body.";
-    const auto body = [](const char* attributes) {
-        return "<ZephDimCurve zephSaveFileVersion=\"1.5.0\"><Dimming_Curve><P " + std::string(attributes) +
-               "/></Dimming_Curve></ZephDimCurve>";
-    };
     const std::pair<std::string, std::string> cases[] = {
-        {"<ZephDimCurve zephSaveFileVersion=\"1.5.0\"><Dimming_Curve>",
-         "The Dimming Curve file is invalid or corrupted."},
+        {open, "The Dimming Curve file is invalid or corrupted."},
         {"<Zeph zephSaveFileVersion=\"1.5.0\"/>", "This is not a valid Dimming Curve for this application."},
         {"<ZephDimCurve zephSaveFileVersion=\"3.0.0\"/>",
          "The File Version for the dimming curve is incompatible for this application."},
-        {"<ZephDimCurve zephSaveFileVersion=\"1.5.0\"/>", noBody},
-        {body("ID=\"1\" Value=\"256\""), noBody},
-        {body("ID=\"256\" Value=\"1\""), noBody},
-        {body("ID=\"1\""), noBody},
+        {head + "/>", noBody},
+        {open + "<P ID=\"1\" Value=\"256\"/>" + close, noBody},
+        {open + "<P ID=\"256\" Value=\"1\"/>" + close, noBody},
+        {open + "<P ID=\"1\"/>" + close, noBody},
     };
     LoadBench bench;
     ZephDimmingCurve curve;

@@ -13,10 +13,9 @@ struct Display {
     CountingWatcher watcher;
 
     Display(int fixtures, int props) {
-        simulation->FixtureCount = fixtures;
+        while (simulation->FixtureCount < fixtures)
+            addFixture(*simulation, kFixtureStrings);
         simulation->PropCount = props;
-        for (int f = 1; f <= fixtures; ++f)
-            simulation->Fixtures[f].Name = "F" + std::to_string(f);
         for (int p = 1; p <= props; ++p)
             simulation->Props[p].Name = "P" + std::to_string(p);
     }
@@ -118,9 +117,7 @@ TEST(Tables, NumbersReadAsTheirNames) {
     display.simulation->Fixtures[1].Name = "New Fixture 1";
     display.simulation->Fixtures[2].Name = "new fixture 2";
     EXPECT_EQ(ZephReturnNewFixtureName(*display.simulation), "New Fixture 2") << "the first free one by exact case";
-}
-
-TEST(Tables, RibbonResolutionsKeepTheirUnevenRow) {
+    // Ribbon resolutions have an uneven row.
     ZephFixture fixture;
     fixture.Kesh.Resolution = 5;
     EXPECT_EQ(KeshResolutionToResolutionCount(3), 17);

@@ -24,15 +24,6 @@ struct ObjectBench : LoadBench {
     }
 };
 
-ZephFixture sampleFixture(std::int32_t type) {
-    const auto document = std::make_unique<ZephSimulation>();
-    ZephFixture& fixture = addFixture(*document, type, {{1, 2}, {-1, 3}});
-    fixture.Channel_Type = kChannelNormal;
-    fixture.Name = "F & G";
-    addChannel(fixture, 1, 2).Name = "c";
-    return fixture;
-}
-
 constexpr std::string_view kDrawObject =
     "<DrawObject ID=\"9\" Name=\"F\" BulbSize=\"1\" BulbSpacing=\"1\" Comment=\"\" BulbShape=\"1\" ZOrder=\"1\" "
     "AssignedItem=\"7\" Locked=\"False\">%</DrawObject>";
@@ -69,7 +60,10 @@ TEST(ObjectFiles, AFixtureComesAlongAlone) {
     for (const std::int32_t type : {kFixtureStrings, kFixtureKesh, kFixtureDmxPixels}) {
         for (const int choice : {kChannelChoiceYes, kChannelChoiceNo}) {
             ObjectBench bench;
-            ZephFixture fixture = sampleFixture(type);
+            ZephFixture fixture = addFixture(*bench.simulation, type, {{1, 2}, {-1, 3}});
+            fixture.Channel_Type = kChannelNormal;
+            fixture.Name = "F & G";
+            addChannel(fixture, 1, 2).Name = "c";
             fixture.AssignedItem = 3;
             fixture.Kesh.Base_Unit = type == kFixtureKesh ? 5 : 0;
             fixture.DMX.Universe = type == kFixtureDmxPixels ? 9 : 0;
@@ -124,29 +118,25 @@ TEST(ObjectFiles, APropTakesItsFixturesAlongInOrder) {
 
 TEST(ObjectFiles, SayWhatIsWrongWithAFile) {
     const std::string good = objects(1);
-    struct Row {
-        std::string text;
-        bool prop;
-        const char* box;
-    };
-    for (const Row& row : std::vector<Row>{
-             {"<ZephFixture", false, "Corrupted Fixture File|Error:  The fixture file is invalid or corrupted."},
-             {"", true, "Corrupted Prop File|Error:  The Prop file is invalid or corrupted."},
-             {file("Zeph", "3.0.0", good), false,
-              "Invalid Fixture File|Error:  This is not a valid fixture file for this application."},
-             {file("ZephFixture", "3.0.0", good), true,
-              "Invalid Prop File|Error:  This is not a valid Prop file for this application."},
-             {file("ZephFixture", "3.0.1", good), false,
-              "-Not a valid file|Error:  The File Version is incompatible for this application.\r\nPlease contact "
-              "support for an upgrade."},
-             {file("ZephFixture", "2.0.0", objects(1, "<Sample/>")), false,
-              "-Fixture Load|Error:  Could Not load the fixture's body."},
-             {file("ZephProp", "2.1.0", good), true, "-Prop Load|Error:  Could Not load the prop's body."}}) {
-        SCOPED_TRACE(row.text);
+    const std::tuple<std::string, bool, const char*> rows[] = {
+        {"<ZephFixture", false, "Corrupted Fixture File|Error:  The fixture file is invalid or corrupted."},
+        {"", true, "Corrupted Prop File|Error:  The Prop file is invalid or corrupted."},
+        {file("Zeph", "3.0.0", good), false,
+         "Invalid Fixture File|Error:  This is not a valid fixture file for this application."},
+        {file("ZephFixture", "3.0.0", good), true,
+         "Invalid Prop File|Error:  This is not a valid Prop file for this application."},
+        {file("ZephFixture", "3.0.1", good), false,
+         "-Not a valid file|Error:  The File Version is incompatible for this application.\r\nPlease contact "
+         "support for an upgrade."},
+        {file("ZephFixture", "2.0.0", objects(1, "<Sample/>")), false,
+         "-Fixture Load|Error:  Could Not load the fixture's body."},
+        {file("ZephProp", "2.1.0", good), true, "-Prop Load|Error:  Could Not load the prop's body."}};
+    for (const auto& [text, prop, box] : rows) {
+        SCOPED_TRACE(text);
         ObjectBench bench;
-        EXPECT_FALSE(row.prop ? bench.propText(row.text) : bench.fixtureText(row.text));
-        EXPECT_EQ(bench.told(), row.box);
-        EXPECT_TRUE(row.prop || bench.simulation->Fixtures[1] == ZephFixture());
+        EXPECT_FALSE(prop ? bench.propText(text) : bench.fixtureText(text));
+        EXPECT_EQ(bench.told(), box);
+        EXPECT_TRUE(prop || bench.simulation->Fixtures[1] == ZephFixture());
     }
     ObjectBench bench;
     ZephSimulation& document = *bench.simulation;

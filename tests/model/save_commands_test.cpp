@@ -32,13 +32,8 @@ struct SaveBench : LoadBench, SaveFace, AutoSaveFace {
     }
     void openOldFile() {
         folder.write("display.zee", kOldFile);
-        ASSERT_TRUE(load());
-        ASSERT_TRUE(simulation->FileUpgraded);
+        ASSERT_TRUE(load() && simulation->FileUpgraded);
         simulation->SimulationDirty = true;
-    }
-    void openChanged(std::int32_t minutes) {
-        settings.AutoSave = minutes;
-        simulation->SimulationOpen = simulation->SimulationDirty = true;
     }
     void saveNow() { mnuFileSave_Click(saving, *simulation, autosave); }
 };
@@ -125,7 +120,8 @@ TEST(Saving, AFailureLeavesTheOldFileAsItIs) {
 
 TEST(AutoSave, SavesAfterThirtySixSecondsAMinute) {
     SaveBench bench;
-    bench.openChanged(2);
+    bench.settings.AutoSave = 2;
+    bench.simulation->SimulationOpen = bench.simulation->SimulationDirty = true;
     bench.host.panels[2] = "kept";
     bench.tick(119);
     EXPECT_EQ(bench.saved, 0);
@@ -149,7 +145,8 @@ TEST(AutoSave, SavesAfterThirtySixSecondsAMinute) {
 
 TEST(AutoSave, WarnsAgainAndAgainWhereThereIsNoName) {
     SaveBench bench;
-    bench.openChanged(1);
+    bench.settings.AutoSave = 1;
+    bench.simulation->SimulationOpen = bench.simulation->SimulationDirty = true;
     bench.simulation->FileName.clear();
     bench.tick(179);
     EXPECT_EQ(bench.host.panel2History,

@@ -49,11 +49,8 @@ void openDisplay(UndoBench& bench) {
 }
 
 // What is written of a document that has read the text: a reader knows the device 99 by another number.
-std::string asRead(std::string text) {
-    constexpr std::string_view kWritten = "DeviceType=\"99\"";
-    for (std::size_t at = text.find(kWritten); at != std::string::npos; at = text.find(kWritten, at))
-        text.replace(at, kWritten.size(), "DeviceType=\"-1\"");
-    return text;
+std::string asRead(const std::string& text) {
+    return QByteArray::fromStdString(text).replace("DeviceType=\"99\"", "DeviceType=\"-1\"").toStdString();
 }
 
 // One change of the kind that commands, dialogs and damaged files leave behind.
@@ -179,38 +176,32 @@ TEST(Undo, DescribesEachActionAndReturnsToItsState) {
     document.Fixtures[1].AssignedItem = 3;
     document.Props[1].Name = "P1";
     document.Props[3].Name = "P3";
-    struct Row {
-        int state;
-        std::int32_t action;
-        int object;
-        std::int32_t kept;
-        const char* text;
-        int mode;
-    };
-    for (const Row& row : std::vector<Row>{{3, 1, 1, 1, "Deleted F", 3},
-                                           {3, 4, 1, 4, "End Drawing of F", 3},
-                                           {4, 4, 2, 4, "End New Drawing", 4},
-                                           {3, 6, 1, 6, "Cut F", 3},
-                                           {2, 6, 1, 21, "Cut P3", 2},
-                                           {2, 7, 1, 23, "Pasted P3", 2},
-                                           {2, 9, 1, 24, "Changed P3", 2},
-                                           {2, 10, 1, 25, "Sent Home P3", 2},
-                                           {2, 8, 1, 8, "Properties Change Of F", 3},
-                                           {3, 16, 1, 16, "UnLocked Fixture F", 3},
-                                           {3, 19, 1, 19, "Changed Prop P1", 2},
-                                           {3, 20, 1, 20, "Deleted P3", 3},
-                                           {3, 17, 600, 17, "Created Prop Name ", 3},
-                                           {3, 29, 1, 29, "Ran Mega Tree Wizard - 8 bundles", 3},
-                                           {4, 34, 1, 34, "Changed Editor Properties", 3},
-                                           {4, 36, 1, 36, "", 4},
-                                           {4, 99, 1, 99, "", 4}}) {
-        SCOPED_TRACE(row.text);
+    const std::tuple<int, std::int32_t, int, std::int32_t, const char*, int> rows[] = {
+        {3, 1, 1, 1, "Deleted F", 3},
+        {3, 4, 1, 4, "End Drawing of F", 3},
+        {4, 4, 2, 4, "End New Drawing", 4},
+        {3, 6, 1, 6, "Cut F", 3},
+        {2, 6, 1, 21, "Cut P3", 2},
+        {2, 7, 1, 23, "Pasted P3", 2},
+        {2, 9, 1, 24, "Changed P3", 2},
+        {2, 10, 1, 25, "Sent Home P3", 2},
+        {2, 8, 1, 8, "Properties Change Of F", 3},
+        {3, 16, 1, 16, "UnLocked Fixture F", 3},
+        {3, 19, 1, 19, "Changed Prop P1", 2},
+        {3, 20, 1, 20, "Deleted P3", 3},
+        {3, 17, 600, 17, "Created Prop Name ", 3},
+        {3, 29, 1, 29, "Ran Mega Tree Wizard - 8 bundles", 3},
+        {4, 34, 1, 34, "Changed Editor Properties", 3},
+        {4, 36, 1, 36, "", 4},
+        {4, 99, 1, 99, "", 4}};
+    for (const auto& [state, action, object, kept, text, mode] : rows) {
+        SCOPED_TRACE(text);
         ZephStartUndoTransaction(bench.stores);
-        bench.ZephUIState = row.state;
-        EXPECT_EQ(bench.add(row.action, row.object), row.kept);
+        bench.ZephUIState = state;
+        EXPECT_EQ(bench.add(action, object), kept);
         const ZephUndoEntry& entry = bench.stores.UndoStore.back();
-        EXPECT_EQ(entry.Text, row.text);
-        EXPECT_EQ(entry.EditorMode, row.mode);
+        EXPECT_EQ(entry.Text, text);
+        EXPECT_EQ(entry.EditorMode, mode);
     }
     ZephCommitUndo(bench.stores);
     bench.ZephUIState = kStateSelectFixture;
@@ -265,9 +256,7 @@ TEST(Undo, RedoOutlivesALoadAndNamesNothing) {
     EXPECT_EQ(bench.stores.UndoPosition, 1);
     EXPECT_EQ(ZephUndoCaptions(bench.stores).undoItem, "Undo Deleted ");
     bench.step(kUndoDeletedFixture, 1, "new");
-    const UndoCaptions captions = ZephUndoCaptions(bench.stores);
-    EXPECT_EQ(captions.undoItem, "Undo Deleted old");
-    EXPECT_EQ(captions.undoTip, "Undo: Deleted old");
-    EXPECT_EQ(captions.redoItem, "Redo");
-    EXPECT_EQ(captions.redoTip, "Redo");
+    const auto [undoItem, undoTip, redoItem, redoTip] = ZephUndoCaptions(bench.stores);
+    EXPECT_EQ(undoItem + "|" + undoTip, "Undo Deleted old|Undo: Deleted old");
+    EXPECT_EQ(redoItem + "|" + redoTip, "Redo|Redo");
 }

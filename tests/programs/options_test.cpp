@@ -1,28 +1,12 @@
 #include "programs/tool/options.h"
+#include "util/command_line.h"
 
-#include <iterator>
-#include <sstream>
-
-namespace {
-
-std::vector<std::string> words(const std::string& call) {
-    std::istringstream stream(call);
-    return {std::istream_iterator<std::string>(stream), {}};
-}
-
-}  // namespace
-
-TEST(ToolOptions, TakeEachCommandsSwitches) {
-    const ToolOptions trace =
-        parseToolOptions(words("trace a.zee --capture b.zcap --until 90 --engine opengl --json")).options;
-    EXPECT_EQ(trace.file + trace.capture + trace.engine, "a.zeeb.zcapopengl");
-    EXPECT_EQ(trace.until, 90);
-    EXPECT_TRUE(trace.json);
-    const ToolOptions send = parseToolOptions(words("send --loop b.zcap --speed 2.5 --port 1")).options;
+// Those of the commands that end by themselves are tested by calling the tool.
+TEST(ToolOptions, TakeTheSwitchesOfSend) {
+    const ToolOptions send = parseToolOptions(GetCommandLine("send --loop b.zcap --speed 2.5 --port 1", 9)).options;
     EXPECT_TRUE(send.loop);
     EXPECT_EQ(send.speed, 2.5);
     EXPECT_EQ(send.port, 1);
-    EXPECT_EQ(parseToolOptions(words("convert a.zee --force b.zee")).options.secondFile, "b.zee");
 }
 
 TEST(ToolOptions, NameWhatIsWrongWithACall) {
@@ -43,5 +27,5 @@ TEST(ToolOptions, NameWhatIsWrongWithACall) {
         {"convert a", "no file to write is named"},
     };
     for (const auto& [call, problem] : rows)
-        EXPECT_EQ(parseToolOptions(words(call)).problem, problem) << call;
+        EXPECT_EQ(parseToolOptions(GetCommandLine(call, 99)).problem, problem) << call;
 }
