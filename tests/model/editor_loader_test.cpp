@@ -63,6 +63,19 @@ TEST(Loading, ReplacesEverythingThatWasOpen) {
     EXPECT_EQ(bench.watcher.clipboards, 1);
 }
 
+TEST(Loading, EachVersionHasItsBodyAndOldOnesCountAsUpgraded) {
+    for (const std::string version : {"1.5.2", "2.0.0", "2.0.1", "2.1.0", "3.0.0"}) {
+        LoadBench bench;
+        // Without the export fields a prop is whole in version 2 and damaged in version 3.
+        const bool old = version != "3.0.0";
+        EXPECT_EQ(bench.read("<Zeph zephSaveFileVersion=\"" + version +
+                             "\"><Items><Item ID=\"1\" Name=\"P\" Locked=\"True\" Comment=\"\"/></Items></Zeph>"),
+                  old);
+        EXPECT_EQ(bench.simulation->FileUpgraded, old) << version;
+        EXPECT_EQ(bench.simulation->PropCount, 1);
+    }
+}
+
 TEST(Loading, TheLedDefaultOutlivesTheLoadThatSetIt) {
     LoadBench bench;
     const auto ledAfter = [&](std::string_view version, std::string_view led) {
@@ -111,6 +124,15 @@ TEST(Loading, TheChecksumOnlyRaisesItsFlag) {
         }
     }
     EXPECT_EQ(bench.host.boxTexts(), "");
+}
+
+TEST(Loading, WideEncodingsReadLikeUtf8) {
+    LoadBench bench;
+    for (const char* mark : {"", "\xFF\xFE"}) {
+        EXPECT_FALSE(bench.read(mark + utf16Bytes(u"<Zeph zephSaveFileVersion=\"3.0.0\"><Items><Item ID=\"1\" "
+                                                  u"Name=\"\u00e4\U0001F384\" Locked=\"?\"/></Items></Zeph>")));
+        EXPECT_EQ(bench.simulation->Props[1].Name, "\xC3\xA4\xF0\x9F\x8E\x84");
+    }
 }
 
 TEST(Loading, WhatIsNoXmlIsRefused) {
