@@ -112,6 +112,9 @@ TEST_F(EditCommands, AFixtureComesHomeSelectedAsOneStep) {
     mnuUndo_Click(context);
     EXPECT_EQ(rig.simulation->FixtureCount, 3);
     EXPECT_EQ(rig.editor.ZephSelection.Object, 0);
+    rig.simulation->SimulationOpen = false;
+    mnuRedo_Click(context);
+    EXPECT_EQ(rig.simulation->FixtureCount, 3) << "there is no document to fill";
 }
 
 TEST_F(EditCommands, APropComesHomeAsAWhole) {
