@@ -17,7 +17,7 @@ TEST(CaptureFile, ReadsPiecesWithTheirBytes) {
     EXPECT_EQ(capture.cutLine, 0);
 }
 
-TEST(CaptureFile, EveryOtherFormIsAnErrorThatNamesItsLine) {
+TEST(CaptureFile, EveryOtherFormIsAFailureThatNamesFileAndLineAsIsAFileThatCannotBeUsed) {
     const Folder folder;
     const std::string path = folder.path("bad.zcap");
     const std::pair<const char*, const char*> rows[] = {
@@ -35,6 +35,9 @@ TEST(CaptureFile, EveryOtherFormIsAnErrorThatNamesItsLine) {
         EXPECT_THAT([&] { (void)loadCapture(path); },
                     testing::ThrowsMessage<Failure>(testing::StartsWith(path + ", " + begins)));
     }
+    EXPECT_THROW(loadCapture(folder.path("none/x.zcap")), Failure);
+    EXPECT_THROW(CaptureWriter(folder.path("none/x.zcap")), Failure);
+    EXPECT_THROW(CaptureWriter("/dev/full"), Failure);
 }
 
 TEST(CaptureFile, ALastLineThatWasCutIsLeftOutAndTold) {
@@ -57,11 +60,4 @@ TEST(CaptureFile, EveryByteSurvivesWritingAndReading) {
     writer.piece(7, all);
     EXPECT_THROW(writer.piece(6, "x"), Failure);
     EXPECT_EQ(loadCapture(folder.path("all.zcap")).pieces, (std::vector<CapturePiece>{{0, kFrame}, {7, all}}));
-}
-
-TEST(CaptureFile, AFileThatCannotBeUsedIsAFailure) {
-    const Folder folder;
-    EXPECT_THROW(loadCapture(folder.path("none/x.zcap")), Failure);
-    EXPECT_THROW(CaptureWriter(folder.path("none/x.zcap")), Failure);
-    EXPECT_THROW(CaptureWriter("/dev/full"), Failure);
 }

@@ -24,7 +24,7 @@ using Strings = std::vector<std::string>;
 
 }  // namespace
 
-TEST_F(Communications, UdpBindsTheChosenAdapterOnceAndTunesTheBufferOnEachCall) {
+TEST_F(Communications, BindOrListenOnceAndTuneTheBufferOnEachCall) {
     connection.ZephAdapterName = "eth0";
     EXPECT_TRUE(setUp());
     connection.ZephSimulationPort = 5;  // takes effect with the next start of the program
@@ -32,9 +32,10 @@ TEST_F(Communications, UdpBindsTheChosenAdapterOnceAndTunesTheBufferOnEachCall) 
     EXPECT_EQ(simulationActiveText(false, ip, port), "UDP Simulation active on 192.168.1.20 (30303)");
     EXPECT_EQ(socket.calls, (Strings{"bind 192.168.1.20 30303", "buffer 2097152", "buffer 2097152"}));
     EXPECT_EQ(log, Strings(2, "Receive buffer: 2097152 bytes asked for, 212992 granted"));
-}
 
-TEST_F(Communications, AnUnknownAdapterFallsBackToLocalAndTcpListensOnAllAddresses) {
+    // An unknown adapter falls back to Local, and TCP listens on all addresses.
+    socket = {};
+    connection = {};
     connection.ZephAdapterName = "eth7";
     connection.ZephUseTCP = true;
     EXPECT_TRUE(setUp());
