@@ -4,13 +4,6 @@
 
 #include <cmath>
 
-namespace {
-
-constexpr std::int32_t kWidth = 160;
-constexpr std::int32_t kHeight = 140;
-
-}  // namespace
-
 TEST(BlendPixel, RoundsTheExactResultOnce) {
     // Every source, coverage and alpha in steps of 5 and 17, over three destinations; the formula in real numbers. No
     // tie can occur, since 65025 is odd.
@@ -32,41 +25,38 @@ TEST(BlendPixel, RoundsTheExactResultOnce) {
 }
 
 TEST(BlendKernels, AllFormsGiveThePixelsOfTheReference) {
+    constexpr std::int32_t kWidth = 160;
+    constexpr std::int32_t kHeight = 140;
     SeededRandom random(11);
+    const auto pick = [&](std::int32_t low, std::int32_t high) { return ZephReturnRandomNumber(low, high, random); };
     ZephDimmingCurve anyCurve{};  // floods of any coverage
     for (std::uint8_t& level : anyCurve)
-        level = static_cast<std::uint8_t>(ZephReturnRandomNumber(0, 255, random));
+        level = static_cast<std::uint8_t>(pick(0, 255));
     const auto noisy = makeMasks(anyCurve);
-    for (std::int32_t round = 0; round < 600; ++round) {
-        const std::int32_t shape = ZephReturnRandomNumber(1, kBulbShapes, random);
-        const BulbMask& mask = round % 3 == 0
-                                   ? noisy->ZephFloodMasks[ZephReturnRandomNumber(1, kMaxFloodSize, random)]
-                                   : noisy->ZephBulbMasks[ZephReturnRandomNumber(1, kMaxBulbSize, random)][shape];
+    for (int round = 0; round < 600; ++round) {
+        const BulbMask& mask = round % 3 == 0 ? noisy->ZephFloodMasks[pick(1, kMaxFloodSize)]
+                                              : noisy->ZephBulbMasks[pick(1, kMaxBulbSize)][pick(1, kBulbShapes)];
         BulbImage image;
-        makeBulbImage(&mask, ZephReturnRandomNumber(0, kWhite, random), image);
+        makeBulbImage(&mask, pick(0, kWhite), image);
         const BulbSprite sprite = spriteOf(image);
-        const std::int32_t kind = ZephReturnRandomNumber(1, 4, random);
-        const auto alpha = static_cast<std::uint8_t>(kind == 1   ? 255
-                                                     : kind == 2 ? ZephReturnRandomNumber(1, 3, random)
-                                                                 : ZephReturnRandomNumber(0, 255, random));
+        const auto alpha = static_cast<std::uint8_t>(pick(1, 4) == 1 ? 255 : pick(0, pick(1, 3) == 1 ? 3 : 255));
         std::vector<BulbItem> items(3);
-        for (BulbItem& item : items)
-            item.Place = {static_cast<std::int16_t>(ZephReturnRandomNumber(0, kWidth - 134, random)),
-                          static_cast<std::int16_t>(ZephReturnRandomNumber(-20, kHeight - 1, random))};
+        for (BulbItem& item : items) {
+            item.Place.X = static_cast<std::int16_t>(pick(0, kWidth - 134));
+            item.Place.Y = static_cast<std::int16_t>(pick(-20, kHeight - 1));
+        }
         std::vector<std::uint32_t> before(kWidth * kHeight);
         for (std::uint32_t& pixel : before)
-            pixel = 0xFF000000U | static_cast<unsigned>(ZephReturnRandomNumber(0, kWhite, random));
-        const RowRange rows{ZephReturnRandomNumber(0, 60, random), ZephReturnRandomNumber(61, kHeight, random)};
-
+            pixel = 0xFF000000U | static_cast<unsigned>(pick(0, kWhite));
+        const RowRange rows{pick(0, 60), pick(61, kHeight)};
         const auto blended = [&](BlendForm form) {
             std::vector<std::uint32_t> pixels = before;
             blendKernels(form).blendItems(items, &alpha, &sprite, rows, {pixels.data(), kWidth});
             return pixels;
         };
-        const std::vector<std::uint32_t> expected = blended(BlendForm::Reference);
-        ASSERT_EQ(blended(BlendForm::Portable), expected) << "size " << mask.Size << " soft " << mask.Soft;
-        if (blendFormAvailable(BlendForm::Avx2)) {
-            ASSERT_EQ(blended(BlendForm::Avx2), expected) << "size " << mask.Size << " soft " << mask.Soft;
+        for (const BlendForm form : {BlendForm::Portable, BlendForm::Avx2}) {
+            if (!blendFormAvailable(form)) continue;
+            ASSERT_EQ(blended(form), blended(BlendForm::Reference)) << "size " << mask.Size << " soft " << mask.Soft;
         }
     }
 }

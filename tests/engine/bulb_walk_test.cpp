@@ -31,12 +31,9 @@ TEST(BulbWalk, ChannelsTakeTurnsAndTheRemainderCarriesOver) {
     const ZephFixture two = stringFixture({{6, 0, 0}, {2, 35, 0}, {2, 35, 40}}, 2);
     EXPECT_EQ(walked(two, 1), "0,0/1 20,0/1 35,5/1 35,25/1 ");
     EXPECT_EQ(walked(two, 2), "10,0/1 30,0/1 35,15/1 35,35/1 ");
-}
-
-TEST(BulbWalk, NoBulbHangsOnTheLastPointAndNoneOnALineShorterThanTheOffset) {
+    // No bulb hangs on the last point, and none on a line that is shorter than the offset.
     EXPECT_EQ(walked(stringFixture({{6, 0, 0}, {2, 20, 0}}, 1), 1), "0,0/1 10,0/1 ");
-    const ZephFixture shortLine = stringFixture({{6, 0, 0}, {2, 8, 0}, {2, 8, 8}}, 2);
-    EXPECT_EQ(walked(shortLine, 2), "8,2/1 ");
+    EXPECT_EQ(walked(stringFixture({{6, 0, 0}, {2, 8, 0}, {2, 8, 8}}, 2), 2), "8,2/1 ");
     // A line that ends exactly where the offset does carries the bulb.
     EXPECT_EQ(walked(stringFixture({{6, 0, 0}, {2, 10, 0}}, 2), 2), "10,0/1 ");
 }
@@ -67,12 +64,7 @@ TEST(BulbWalk, DamagedFixturesEndTheWalk) {
         {"pitch 0", [](ZephFixture& f) { f.BulbSpacing = -4; }, ""},
         {"pitch overflows", [](ZephFixture& f) { f.BulbSpacing = f.BulbSize = 2147483647; }, "0,0/1 "},
         {"no channel counts as one", [](ZephFixture& f) { f.ChannelCount = 0; }, "0,0/1 10,0/1 "},
-        {"an RGB fixture counts as one",
-         [](ZephFixture& f) {
-             f.Channel_Type = kChannelRgb;
-             f.ChannelCount = 3;
-         },
-         "0,0/1 10,0/1 "},
+        {"an RGB fixture counts as one", [](ZephFixture& f) { makeRgb(f, 1, 1); }, "0,0/1 10,0/1 "},
         {"colours 0", [](ZephFixture& f) { f.Channels[1].Sub_Type = kSpecialMultiColor; }, "0,0/1 10,0/1 "},
         {"no points", [](ZephFixture& f) { f.PointCount = -3; }, ""},
         {"a line without length", [](ZephFixture& f) { f.DrawPoints[2].X = 0; }, ""},

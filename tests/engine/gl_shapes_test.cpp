@@ -15,9 +15,8 @@ TEST(GLShapes, PutsTheCirclePointsWhereTheAnglesLie) {
 }
 
 TEST(GLShapes, HasNoTrianglesForWhatCannotBeDrawn) {
-    constexpr std::array<std::pair<std::int32_t, std::int32_t>, 10> kOdd{
-        {{1, 0}, {1, 65}, {12, -1}, {11, 65}, {2, 0}, {2, 17}, {3, 64}, {0, 4}, {13, 4}, {-1, 4}}};
-    for (const auto& [shape, size] : kOdd)
+    for (const auto& [shape, size] :
+         {std::pair{1, 0}, {1, 65}, {12, -1}, {11, 65}, {2, 0}, {2, 17}, {3, 64}, {0, 4}, {13, 4}, {-1, 4}})
         EXPECT_EQ(fillOf(masks().GLShapes, shape, size), nullptr) << shape << " of size " << size;
     EXPECT_TRUE(fillPolygonByTriangles({{0, 0}, {4, 4}, {2, 2}, {0, 0}}).Triangles.empty());
     EXPECT_TRUE(fillPolygonByTriangles({}).Triangles.empty());

@@ -8,6 +8,8 @@ using testing::ElementsAre;
 
 namespace {
 
+struct RenderTable : testing::Test, EngineRig {};
+
 std::vector<std::int32_t> keys(const ZephRenderTables& tables) {
     return {tables.Keys.begin() + 1, tables.Keys.end()};
 }
@@ -20,20 +22,19 @@ void addVirtual(ZephFixture& fixture, const std::string& name) {
 
 }  // namespace
 
-TEST(RenderTable, SortsKeysAndKeepsFixtureOrderWithinOne) {
-    EngineRig rig;
-    addChannel(rig.addPlain(2, 5), 0, 1).DeviceType = kDeviceClearedInFile;
-    ZephChannel& dmx = addChannel(rig.addPlain(1, 9), 77, 12);
+TEST_F(RenderTable, SortsKeysAndKeepsFixtureOrderWithinOne) {
+    addChannel(addPlain(2, 5), 0, 1).DeviceType = kDeviceClearedInFile;
+    ZephChannel& dmx = addChannel(addPlain(1, 9), 77, 12);
     dmx.DeviceType = kDeviceDmx;
     dmx.Network = 5;
-    rig.addPlain(2, 5);
-    rig.build();
-    EXPECT_THAT(keys(rig.tables), ElementsAre(-99'999'999, 100'001'009, 100'002'005, 700'500'012));
-    const auto shared = rig.tables.Slots.begin() + rig.tables.RenderData[3].FirstSlot;
+    addPlain(2, 5);
+    build();
+    EXPECT_THAT(keys(tables), ElementsAre(-99'999'999, 100'001'009, 100'002'005, 700'500'012));
+    const auto shared = tables.Slots.begin() + tables.RenderData[3].FirstSlot;
     EXPECT_THAT((std::array{shared[0].Fixture, shared[1].Fixture}), ElementsAre(1, 3));
-    EXPECT_EQ(rig.simulation->Fixtures[1].Channels[2].DeviceType, kDeviceCleared) << "marked in the document";
-    EXPECT_EQ(FindCommandData(BuildCmdKey(kDeviceDmx, 5, 123, 12), rig.tables), 4) << "the unit takes no part";
-    EXPECT_THAT(rig.host.panel2History,
+    EXPECT_EQ(simulation->Fixtures[1].Channels[2].DeviceType, kDeviceCleared) << "marked in the document";
+    EXPECT_EQ(FindCommandData(BuildCmdKey(kDeviceDmx, 5, 123, 12), tables), 4) << "the unit takes no part";
+    EXPECT_THAT(host.panel2History,
                 ElementsAre("Reset Rendering Parms", "Building Virtual Keys", "Building Virtual Keys",
                             "Building Virtual Keys", "Compiling Master/Slave Keshs",
                             "Compiling Master/Slave Pixel Universes", "Creating Channel Table for Fixture-1",
@@ -41,92 +42,83 @@ TEST(RenderTable, SortsKeysAndKeepsFixtureOrderWithinOne) {
                             "Pre-build all bulb locations", "Finishing up"));
 }
 
-TEST(RenderTable, KeepsSixteenFixturesOfAKeyAndNumbersGroupsByWhatItKeeps) {
-    EngineRig rig;
+TEST_F(RenderTable, KeepsSixteenFixturesOfAKeyAndNumbersGroupsByWhatItKeeps) {
     for (int i = 0; i < 17; ++i)
-        rig.addRgb(1, 1);
-    rig.addRgb(2, 1);
-    rig.build();
-    EXPECT_EQ(rig.tables.RenderData[1].SlotCount, 16);
-    EXPECT_EQ(rig.tables.RGBData.size() - 1, 17u) << "16 of the first address and the one of the second";
-    EXPECT_EQ(rig.tables.RGBData[17].Key, 18'000);
+        addRgb(1, 1);
+    addRgb(2, 1);
+    build();
+    EXPECT_EQ(tables.RenderData[1].SlotCount, 16);
+    EXPECT_EQ(tables.RGBData.size() - 1, 17u) << "16 of the first address and the one of the second";
+    EXPECT_EQ(tables.RGBData[17].Key, 18'000);
 }
 
-TEST(RenderTable, ReportsKeysThatDoNotFitOnceAndClearedDevicesStayNegative) {
-    EngineRig rig;
-    ZephFixture& fixture = rig.addPlain(1, 1);
+TEST_F(RenderTable, ReportsKeysThatDoNotFitOnceAndClearedDevicesStayNegative) {
+    ZephFixture& fixture = addPlain(1, 1);
     addChannel(fixture, 2'000'000'000, 1);
     addChannel(fixture, 2'000'000'000, 2);
     ZephChannel& cleared = addChannel(fixture, 0, 0);
     cleared.DeviceType = kDeviceCleared;
     cleared.Network = 300;
-    rig.build();
-    EXPECT_THAT(keys(rig.tables), ElementsAre(100'001'001));
-    EXPECT_EQ(rig.failures.reports.size(), 1u);
+    build();
+    EXPECT_THAT(keys(tables), ElementsAre(100'001'001));
+    EXPECT_EQ(failures.reports.size(), 1u);
 }
 
-TEST(VirtualChannels, AreFoundInAnyCaseAndTheEmptyNameCounts) {
-    EngineRig rig;
-    ZephFixture& fixture = rig.add(kFixtureStrings);
+TEST_F(RenderTable, VirtualChannelsAreFoundInAnyCaseAndTheEmptyNameCounts) {
+    ZephFixture& fixture = add(kFixtureStrings);
     for (const char* name : {"roof", "ARCH", "Roof", "", "Ärch"})
         addVirtual(fixture, name);
-    rig.build();
-    EXPECT_EQ(ZephReturnVirtualChannelKey("", rig.tables), 1);
-    EXPECT_EQ(ZephReturnVirtualChannelKey("arch", rig.tables), 2);
-    EXPECT_EQ(ZephReturnVirtualChannelKey("ROOF", rig.tables), 3);
-    EXPECT_EQ(ZephReturnVirtualChannelKey("no", rig.tables), 0);
-    EXPECT_THAT(keys(rig.tables), ElementsAre(1, 2, 3, 4));
+    build();
+    EXPECT_EQ(ZephReturnVirtualChannelKey("", tables), 1);
+    EXPECT_EQ(ZephReturnVirtualChannelKey("arch", tables), 2);
+    EXPECT_EQ(ZephReturnVirtualChannelKey("ROOF", tables), 3);
+    EXPECT_EQ(ZephReturnVirtualChannelKey("no", tables), 0);
+    EXPECT_THAT(keys(tables), ElementsAre(1, 2, 3, 4));
     const ManualClock clock(0);
-    EXPECT_EQ(RenderTableSink(rig.tables, clock).virtualChannelKey("\xC4RCH"), 4);
+    EXPECT_EQ(RenderTableSink(tables, clock).virtualChannelKey("\xC4RCH"), 4);
 }
 
-TEST(VirtualChannels, TheCallAfter255WarnsOnceEvenWithAKnownName) {
-    EngineRig rig;
+TEST_F(RenderTable, VirtualChannelsTheCallAfter255WarnsOnceEvenWithAKnownName) {
     for (int n = 1; n <= 257; ++n) {
-        if (n % 16 == 1) rig.add(kFixtureStrings);
-        addVirtual(rig.simulation->Fixtures[rig.simulation->FixtureCount], "v" + std::to_string(n > 255 ? 1 : n));
+        if (n % 16 == 1) add(kFixtureStrings);
+        addVirtual(simulation->Fixtures[simulation->FixtureCount], "v" + std::to_string(n > 255 ? 1 : n));
     }
-    rig.build();
-    EXPECT_EQ(rig.host.boxTexts(), "Qen Visualizer-Max Virtual Channels|You have 255 or more virtual channels.\r\nOnly "
-                                   "the first 255 will be simulated.");
-    EXPECT_EQ(rig.tables.VirtualChannelCount, 255);
+    build();
+    EXPECT_EQ(host.boxTexts(), "Qen Visualizer-Max Virtual Channels|You have 255 or more virtual channels.\r\nOnly "
+                               "the first 255 will be simulated.");
+    EXPECT_EQ(tables.VirtualChannelCount, 255);
 }
 
-TEST(RibbonSlots, LegacySpreadsOverTenUnitsEndsWithMagicChannelsAndPixelsFollow) {
-    EngineRig rig;
-    rig.addRibbon(3).Kesh.Unit_Mode = 1;
-    rig.addPixels(2, 4);
-    rig.build();
-    EXPECT_EQ(rig.tables.RenderDataCount, 157 + 12);
-    EXPECT_EQ(rig.tables.Keys[1], 100'003'001);
-    EXPECT_EQ(rig.tables.Keys[157], 100'012'013);
-    EXPECT_EQ(rig.tables.Slots[156].KeshMagic, 157);
+TEST_F(RenderTable, RibbonSlotsLegacySpreadsOverTenUnitsEndsWithMagicChannelsAndPixelsFollow) {
+    addRibbon(3).Kesh.Unit_Mode = 1;
+    addPixels(2, 4);
+    build();
+    EXPECT_EQ(tables.RenderDataCount, 157 + 12);
+    EXPECT_EQ(tables.Keys[1], 100'003'001);
+    EXPECT_EQ(tables.Keys[157], 100'012'013);
+    EXPECT_EQ(tables.Slots[156].KeshMagic, 157);
     // Pixels count three channels a point, from 1001.
-    EXPECT_EQ(rig.tables.Keys[169], 700'200'012);
-    EXPECT_EQ(rig.tables.Slots[168].Triplet, 1004);
-    EXPECT_EQ(rig.tables.Slots[168].Channel, 3);
-    EXPECT_EQ(rig.tables.RGBData.size() - 1, 50u + 4);
+    EXPECT_EQ(tables.Keys[169], 700'200'012);
+    EXPECT_EQ(tables.Slots[168].Triplet, 1004);
+    EXPECT_EQ(tables.Slots[168].Channel, 3);
+    EXPECT_EQ(tables.RGBData.size() - 1, 50u + 4);
 }
 
-TEST(RibbonSlots, SequentialAtACoarseResolutionHasColoursAboveThree) {
-    EngineRig rig;
-    ZephKeshData& ribbon = rig.addRibbon(3).Kesh;
+TEST_F(RenderTable, RibbonSlotsSequentialAtACoarseResolutionHasColoursAboveThree) {
+    ZephKeshData& ribbon = addRibbon(3).Kesh;
     ribbon.Channel_Mode = 1;
     ribbon.Resolution = 3;
-    rig.build();
-    rig.command(3, 49, 0, 100);  // groups of 16, so the fourth colour of the first
-    EXPECT_EQ(rig.shown({9}), "") << "a slot without a place in its group";
+    build();
+    command(3, 49, 0, 100);  // groups of 16, so the fourth colour of the first
+    EXPECT_EQ(shown({9}), "") << "a slot without a place in its group";
 }
 
-TEST(BulbPlaces, SinglePointsAreCutOffToPixels) {
-    EngineRig rig;
-    ZephFixture& flood = rig.add(kFixtureFlood, {{0, 0}});
+TEST_F(RenderTable, BulbPlacesSinglePointsAreCutOffToPixels) {
+    ZephFixture& flood = add(kFixtureFlood, {{0, 0}});
     flood.DrawPoints[1] = {kPointBulb, 29, -16};
     addChannel(flood, 1, 3);
-    rig.build();
-    const std::int32_t first = bulbLocations((*rig.states)[1], 1)->First;
-    const ZephBulbLocation& bulb = rig.tables.BulbPool[static_cast<std::size_t>(first)];
-    EXPECT_EQ(std::pair(bulb.X + 0, bulb.Y + 0), std::pair(1, -1));
+    build();
+    EXPECT_EQ(std::pair(tables.BulbPool.at(0).X + 0, tables.BulbPool.at(0).Y + 0), std::pair(1, -1));
 }
 
 TEST(KeySearch, BothFormsFindWhatABisectionFinds) {

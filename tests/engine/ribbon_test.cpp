@@ -5,7 +5,6 @@
 #include "tests/support/engine_rig.h"
 
 using testing::ElementsAre;
-using testing::IsEmpty;
 
 namespace {
 
@@ -21,15 +20,6 @@ std::string lit(ZephKeshState& ribbon, std::int32_t nowMs = 1000, std::int32_t p
         first = last + 1;
     }
     return text;
-}
-
-std::string motion(int kind, int parm, int position) {
-    ZephKeshState ribbon;
-    ribbon.KeshMotion = kind;
-    ribbon.KeshMotionParm = parm;
-    ribbon.KeshMotionPos = position;
-    ribbon.KeshStrobeOn = true;
-    return lit(ribbon);
 }
 
 }  // namespace
@@ -54,8 +44,7 @@ TEST(RibbonGroups, CoverTheStrandAtEveryResolution) {
           Row{2, 17, 48, 50}, Row{3, 1, 1, 4}, Row{3, 2, 5, 7}, Row{3, 16, 47, 50}, Row{3, 17, 47, 50},
           Row{4, 10, 46, 50}, Row{5, 5, 41, 50}, Row{6, 2, 26, 50}, Row{7, 1, 1, 50}}) {
         const PixelRange group = ribbonGroup(triplet, resolution, 50);
-        EXPECT_EQ(group.first, first) << resolution << "/" << triplet;
-        EXPECT_EQ(group.last, last) << resolution << "/" << triplet;
+        EXPECT_EQ(std::pair(group.first, group.last), std::pair(first, last)) << resolution << "/" << triplet;
     }
     EXPECT_EQ(ribbonGroup(3, 5, 27).last, 27) << "cut at the end of the strand";
     const PixelRange past = ribbonGroup(31, 0, 30);
@@ -84,7 +73,11 @@ TEST(RibbonMotions, LightTheRangesOfTheirRows) {
              {"fill two halves", 8, 0, 20, "21-25 46-50"},
              {"unknown", 12, 50, 50, ""},
          }) {
-        EXPECT_EQ(motion(kind, parm, position), expected) << name;
+        ZephKeshState ribbon;
+        ribbon.KeshMotion = kind;
+        ribbon.KeshMotionParm = parm;
+        ribbon.KeshMotionPos = position;
+        EXPECT_EQ(lit(ribbon), expected) << name;
     }
 }
 
@@ -225,7 +218,7 @@ TEST(RgbEffects, TheGlitterLoopLeavesWhenNoColourCanComeOn) {
     rig.random.values = {0.1, 0.2, 0.8};
     EXPECT_TRUE(ShimmerRGB(slot, {.elapsed = 100'000}, context));
     EXPECT_THAT(rig.group().EffectLevel, ElementsAre(0, 0, 255, 0));
-    EXPECT_THAT(rig.random.values, IsEmpty()) << "drawn until the one colour came on";
+    EXPECT_THAT(rig.random.values, testing::IsEmpty()) << "drawn until the one colour came on";
 }
 
 TEST(RgbEffects, DiscreteColoursComeFromTheMask) {

@@ -2,7 +2,6 @@
 #include "engine/gl_offscreen.h"
 #include "engine/opengl_surface.h"
 #include "tests/support/drawing_stage.h"
-#include "tests/support/recording_host.h"
 
 #include <cstdlib>
 
@@ -18,9 +17,7 @@ struct GLRig {
         start(stage, stage.background);
     }
     void start(const Stage& stage, const QImage& picture, std::int32_t intensity = 100) {
-        EXPECT_TRUE(surface.ZephGLStartup({*stage.simulation, stage.tables, *stage.states, curve, masks().GLShapes,
-                                           picture, intensity, stage.background.width(), stage.background.height()},
-                                          target, failures));
+        EXPECT_TRUE(surface.ZephGLStartup(stage.glScene(picture, intensity), target, failures));
         EXPECT_TRUE(failures.reports.empty()) << failures.reports.front().description;
     }
     QImage frame(const std::vector<Call>& calls, const ZephRenderTables& tables) {
@@ -29,7 +26,6 @@ struct GLRig {
         return target.image();
     }
 
-    ZephDimmingCurve curve = ZephCreateDummyDimmingCurve();
     CollectingFailures failures;
     GLOffscreen target;
     OpenGLSurface surface;
@@ -70,13 +66,7 @@ void compareSquares(std::uint64_t seed, bool full) {
 
     std::vector<Call> calls;
     for (int n = 0; n < 8; ++n) {
-        constexpr std::array kShares{100, 5, 40, 0, 90};
-        const std::int32_t kind = stage.pick(1, 6);
-        if (kind > 1) calls = stage.frame(kShares[static_cast<std::size_t>(stage.pick(0, 4))]);
-        if (kind == 2 && calls.size() > 1) std::reverse(calls.begin(), calls.end());
-        for (std::size_t i = calls.size(); kind == 5 && i > 1; --i)
-            std::swap(calls[i - 1], calls[static_cast<std::size_t>(stage.pick(0, static_cast<int>(i) - 1))]);
-        if (kind == 3) calls.insert(calls.end(), calls.begin(), calls.begin() + std::ssize(calls) / 2);
+        const int kind = stage.nextFrame(calls);
         setOpacity(full, calls);
         // The standard surface keeps an image while colours drift a little; here each is to be made anew.
         for (ZephRGBData& group : standardTables.RGBData)
@@ -176,13 +166,11 @@ TEST(OpenGLSurface, TellsWhyItCannotStart) {
         bool works = false;
     } target;
     DarkStage stage(60, 60, 2, 3, {{30, 30}});
-    const ZephDimmingCurve curve = ZephCreateDummyDimmingCurve();
     CollectingFailures failures;
     OpenGLSurface surface;
     const auto start = [&](std::int32_t width) {
-        return surface.ZephGLStartup(
-            {*stage.simulation, stage.tables, *stage.states, curve, masks().GLShapes, stage.background, 100, width, 60},
-            target, failures);
+        stage.blank(width, 60);
+        return surface.ZephGLStartup(stage.glScene(stage.background), target, failures);
     };
     EXPECT_FALSE(start(60));
     target.works = true;

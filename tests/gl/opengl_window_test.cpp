@@ -2,7 +2,6 @@
 #include "engine/dialogs/opengl_window.h"
 #include "engine/opengl_surface.h"
 #include "tests/support/drawing_stage.h"
-#include "tests/support/recording_host.h"
 
 #include <QApplication>
 #include <QPushButton>
@@ -28,9 +27,7 @@ struct OpenGLWindow : testing::Test {
         ASSERT_TRUE(ZephCreateRenderWindow(stage.background.size(), failures, window));
         window.move(100, 80);
         ASSERT_TRUE(QTest::qWaitForWindowExposed(&window));
-        ASSERT_TRUE(surface.ZephGLStartup(
-            {*stage.simulation, stage.tables, *stage.states, curve, masks().GLShapes, stage.background, 100, 300, 200},
-            window.target(), failures));
+        ASSERT_TRUE(surface.ZephGLStartup(stage.glScene(stage.background), window.target(), failures));
         window.resizeDrawing();
     }
     void TearDown() override {
@@ -55,7 +52,6 @@ struct OpenGLWindow : testing::Test {
     int plays = 0;
     int halts = 0;
     Stage stage;
-    const ZephDimmingCurve curve = ZephCreateDummyDimmingCurve();
     CollectingFailures failures;
     OpenGLSurface surface;
     frmZephOpenGL window{actions()};

@@ -24,7 +24,7 @@ using Strings = std::vector<std::string>;
 
 }  // namespace
 
-TEST_F(Communications, UdpBindsTheChosenAdapterOnceAndTunesTheBufferOnEachCall) {
+TEST_F(Communications, BindOrListenOnceAndTuneTheBufferOnEachCall) {
     connection.ZephAdapterName = "eth0";
     EXPECT_TRUE(setUp());
     connection.ZephSimulationPort = 5;  // takes effect with the next start of the program
@@ -32,9 +32,10 @@ TEST_F(Communications, UdpBindsTheChosenAdapterOnceAndTunesTheBufferOnEachCall) 
     EXPECT_EQ(simulationActiveText(false, ip, port), "UDP Simulation active on 192.168.1.20 (30303)");
     EXPECT_EQ(socket.calls, (Strings{"bind 192.168.1.20 30303", "buffer 2097152", "buffer 2097152"}));
     EXPECT_EQ(log, Strings(2, "Receive buffer: 2097152 bytes asked for, 212992 granted"));
-}
 
-TEST_F(Communications, AnUnknownAdapterFallsBackToLocalAndTcpListensOnAllAddresses) {
+    // An unknown adapter falls back to Local, and TCP listens on all addresses.
+    socket = {};
+    connection = {};
     connection.ZephAdapterName = "eth7";
     connection.ZephUseTCP = true;
     EXPECT_TRUE(setUp());
@@ -43,35 +44,31 @@ TEST_F(Communications, AnUnknownAdapterFallsBackToLocalAndTcpListensOnAllAddress
 }
 
 TEST_F(Communications, EachFailureIsToldAndTriedAgainNextTime) {
-    const struct {
-        std::function<void()> spoil;
-        const char* box;
-        bool open;
-        std::size_t reports;
-    } rows[] = {
-        {[&] { connection.ZephAdapterName = "wlan0"; },
-         "(SetUpCommunications:  No IP)\r\nThere is a problem with your selected network adapter.", false, 0},
-        {[&] { socket.taken = true; }, "Port 30303 is already in use", false, 1},
-        {[&] { socket.openFailure = "The address is protected"; },
-         "Port 30303 cannot be opened: The address is protected", false, 1},
-        {[&] { socket.bufferAnswer.systemError = 22; }, "Error setting SO_BROADCAST option: 22", true, 0},
-    };
-    for (const auto& row : rows) {
+    using Row = std::tuple<std::function<void()>, const char*, bool, std::size_t>;  // spoils, box, port open, reports
+    for (const auto& [spoil, box, open, reports] : {
+             Row{[&] { connection.ZephAdapterName = "wlan0"; },
+                 "(SetUpCommunications:  No IP)\r\nThere is a problem with your selected network adapter.", false, 0},
+             Row{[&] { socket.taken = true; }, "Port 30303 is already in use", false, 1},
+             Row{[&] { socket.openFailure = "The address is protected"; },
+                 "Port 30303 cannot be opened: The address is protected", false, 1},
+             Row{[&] { socket.bufferAnswer.systemError = 22; }, "Error setting SO_BROADCAST option: 22", true, 0},
+         }) {
+        SCOPED_TRACE(box);
         socket = {};
         connection = {};
         host.boxes.clear();
         failures.reports.clear();
-        row.spoil();
-        EXPECT_FALSE(setUp()) << row.box;
-        EXPECT_EQ(connection.ZephPortOpen, row.open) << row.box;
-        EXPECT_THAT(host.boxTexts(), testing::StartsWith(std::string("Qen Visualizer-Port Error|") + row.box));
+        spoil();
+        EXPECT_FALSE(setUp());
+        EXPECT_EQ(connection.ZephPortOpen, open);
+        EXPECT_THAT(host.boxTexts(), testing::StartsWith(std::string("Qen Visualizer-Port Error|") + box));
         EXPECT_EQ(host.boxes.at(0).icon, BoxIcon::Critical);
-        EXPECT_EQ(failures.reports.size(), row.reports) << row.box;
+        EXPECT_EQ(failures.reports.size(), reports);
         for (const CollectingFailures::Report& report : failures.reports)
             EXPECT_EQ(report.procedure, "Zeph.modZephCommunications.ZephSetUpCommunications");
         socket = {};
         connection.ZephAdapterName = "eth0";
-        EXPECT_TRUE(setUp()) << row.box;
+        EXPECT_TRUE(setUp());
     }
 }
 
@@ -117,27 +114,23 @@ TEST(Adapters, TheStartUpCheckChoosesAndWarns) {
     const auto lister = [] {
         return std::vector<ZephAdapter>{{"eth0", "10.0.0.1"}, {"wlan0", "0.0.0.0"}, {"odd", ""}};
     };
-    const struct {
-        const char* stored;
-        const char* name;
-        const char* ip;
-        const char* boxBegins;  // "" = no box
-    } rows[] = {
-        {"", "Local", "127.0.0.1", ""},
-        {"eth0", "eth0", "10.0.0.1", ""},
-        {"gone", "gone", "127.0.0.1", ""},
-        {"wlan0", "wlan0", "0.0.0.0", "Your network adapter is present, however"},
-        {"odd", "Local", "127.0.0.1", "The previously assigned network adapter no longer exists on this system.\r\n"},
-    };
-    for (const auto& row : rows) {
+    using Row = std::array<const char*, 4>;  // stored, name, address, how the box begins ("" = no box)
+    for (const auto& [stored, name, ip, boxBegins] : {
+             Row{"", "Local", "127.0.0.1", ""},
+             Row{"eth0", "eth0", "10.0.0.1", ""},
+             Row{"gone", "gone", "127.0.0.1", ""},
+             Row{"wlan0", "wlan0", "0.0.0.0", "Your network adapter is present, however"},
+             Row{"odd", "Local", "127.0.0.1",
+                 "The previously assigned network adapter no longer exists on this system.\r\n"},
+         }) {
         RecordingHost host;
         ZephAdapters adapters;
-        const AdapterChoice choice = ZephCheckAdapterAtStartup(row.stored, lister, host, adapters);
-        EXPECT_EQ(choice.ZephAdapterName, row.name);
-        EXPECT_EQ(choice.ZephAdapterIP, row.ip);
-        ASSERT_EQ(host.boxes.size(), *row.boxBegins ? 1u : 0u) << row.stored;
+        const AdapterChoice choice = ZephCheckAdapterAtStartup(stored, lister, host, adapters);
+        EXPECT_EQ(choice.ZephAdapterName, name);
+        EXPECT_EQ(choice.ZephAdapterIP, ip);
+        ASSERT_EQ(host.boxes.size(), *boxBegins ? 1u : 0u) << stored;
         if (host.boxes.empty()) continue;
-        EXPECT_THAT(host.boxes[0].text, testing::StartsWith(row.boxBegins));
+        EXPECT_THAT(host.boxes[0].text, testing::StartsWith(boxBegins));
         EXPECT_EQ(host.boxes[0].icon, BoxIcon::Warning);
     }
 }

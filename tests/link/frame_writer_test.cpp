@@ -53,19 +53,14 @@ TEST(FrameWriter, RefusesWhatDoesNotFitAndKeepsTheFrame) {
     for (const auto& each : refused)
         EXPECT_THROW(each(writer), Failure) << &each - refused;
     EXPECT_EQ(writer.takeFrame(), framed("00100119900"));
-}
 
-TEST(FrameWriter, RefusesAFrameOverTheLimitsOnlyWhenItIsTaken) {
-    FrameWriter writer;
+    // A frame over the limits only when it is taken.
     for (int i = 0; i < 1000; ++i)
         writer.noOperation();
     EXPECT_THROW(writer.takeFrame(), Failure);
     EXPECT_EQ(writer.payloadCount(), 1000);
-
     FrameWriter dumps;
-    const std::uint8_t levels[999] = {};
-    for (int i = 0; i < 4; ++i)
-        dumps.dmxDump(1, levels);
-    dumps.dmxDump(1, std::span(levels).first(963));  // 4 x 2013 + 1941 + 7 = 10000
+    for (const std::size_t count : {999U, 999U, 999U, 999U, 963U})  // 4 x 2013 + 1941 + 7 = 10000
+        dumps.dmxDump(1, std::span(levels).first(count));
     EXPECT_THROW(dumps.takeFrame(), Failure);
 }

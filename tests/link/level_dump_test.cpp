@@ -61,13 +61,13 @@ TEST_F(DumpTest, ControllersAreSentAgainWithEachNewDumpAndEmptyTheUniverseOfThei
 }
 
 TEST_F(DumpTest, ABadDigitLeavesTheSlotAndClearingEmptiesAll) {
-    storeDmx(5, "FF");
-    storeController(15, 240, std::string(2 * 999, 'F'));
+    storeDmx(5, std::string(2 * 999, 'F'));
     EXPECT_FALSE(dumps.ZephDmxDumpTable.store(5, "0G"));
-    EXPECT_EQ(dumps.ZephDmxDumpTable.levels(5).front(), 255);
-    const Commands all = controllers();
+    const Commands all = dmx();
     ASSERT_EQ(all.size(), 999u);
-    EXPECT_EQ(all.back(), dumped(15, 1, 240, 999, 100));
+    EXPECT_EQ(all.back(), dumped(5, 7, 0, 999, 100));
+    storeDmx(5, "FF");
+    storeController(15, 240, "FF");
     clearLevelDumps(dumps);
     dumps.ZephDmxDumpPending = dumps.ZephControllerDumpPending = true;
     EXPECT_EQ(dmx(), Commands{});

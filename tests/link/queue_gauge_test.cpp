@@ -3,11 +3,7 @@
 
 TEST(QueueGauge, ColoursByRatioAndSendsAColourOnlyWhenItChanges) {
     constexpr std::int32_t green = packColor(0, 255, 0);
-    const struct {
-        std::size_t length;
-        std::optional<std::int32_t> color;
-        std::int32_t value;
-    } rows[] = {
+    const std::tuple<std::size_t, std::optional<std::int32_t>, std::int32_t> rows[] = {
         {0, green, 0},
         {1'468'006, std::nullopt, 1'468'006},            // 0.69999980
         {1'468'007, packColor(255, 255, 0), 1'468'007},  // 0.70000029
@@ -17,10 +13,10 @@ TEST(QueueGauge, ColoursByRatioAndSendsAColourOnlyWhenItChanges) {
         {7, green, 7},
     };
     QueueGauge gauge;
-    for (const auto& row : rows) {
-        const QueueGaugeUpdate update = ZephUpdateQueueGauge(row.length, false, gauge);
-        EXPECT_EQ(update.color, row.color) << row.length;
-        EXPECT_EQ(update.value, row.value) << row.length;
+    for (const auto& [length, color, value] : rows) {
+        const QueueGaugeUpdate update = ZephUpdateQueueGauge(length, false, gauge);
+        EXPECT_EQ(update.color, color) << length;
+        EXPECT_EQ(update.value, value) << length;
     }
     const QueueGaugeUpdate silent = ZephUpdateQueueGauge(2'000'000, true, gauge);
     EXPECT_FALSE(silent.color || silent.value);

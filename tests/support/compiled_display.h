@@ -32,7 +32,7 @@ struct CompiledDisplay {
     ZephFixture& addRow(std::int32_t type, std::int32_t points) {
         ZephFixture& fixture = add(type, {});
         for (std::int32_t p = 1; p <= points; ++p)
-            addPoint(fixture, kPointBulb, {30 * p, 10 * simulation->FixtureCount});
+            addPlace(fixture, {30 * p, 10 * simulation->FixtureCount});
         return fixture;
     }
     // A main ribbon in Normal unit mode.

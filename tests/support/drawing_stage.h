@@ -2,6 +2,7 @@
 // with the calls of their frames.
 #pragma once
 
+#include "engine/opengl_surface.h"
 #include "engine/standard_surface.h"
 #include "tests/support/compiled_display.h"
 #include "tests/support/masks.h"
@@ -11,18 +12,10 @@
 #include <array>
 #include <optional>
 
-inline QImage noisyPicture(int width, int height, SeededRandom& random) {
-    QImage picture(width, height, QImage::Format_RGB32);
-    for (int y = 0; y < height; ++y) {
-        for (int x = 0; x < width; ++x)
-            picture.setPixel(x, y, 0xFF000000U | static_cast<unsigned>(ZephReturnRandomNumber(0, kWhite, random)));
-    }
-    return picture;
-}
-
 // A display with the images of its bulbs, on a picture; each surface that draws it takes a copy of the tables.
 struct Stage : CompiledDisplay {
     std::unique_ptr<ZephStaticBulbs> bulbs = std::make_unique<ZephStaticBulbs>();
+    ZephDimmingCurve curve = ZephCreateDummyDimmingCurve();
     QImage background;
 
     // A fixture of plain look with one channel, or three circuits, on a unit of its own.
@@ -44,6 +37,10 @@ struct Stage : CompiledDisplay {
         background.fill(color);
     }
 
+    GLScene glScene(const QImage& picture, std::int32_t intensity = 100) const {
+        return {*simulation,        tables, *states, curve, masks().GLShapes, picture, intensity, background.width(),
+                background.height()};
+    }
     SurfaceScene scene(const ZephRenderTables& used) const {
         return {*simulation, used, *states, masks(), *bulbs, background};
     }
@@ -80,7 +77,8 @@ public:
     // everyShape: every size, shape and fixture type, odd ones too; otherwise squares that are no floods, of which
     // every way of drawing covers the same pixels.
     explicit RandomStage(std::uint64_t seed, bool everyShape = true) : everyShape_(everyShape), random_(seed) {
-        background = noisyPicture(pick(1, 3) == 1 ? 97 : 420, pick(20, 170), random_);
+        blank(pick(1, 3) == 1 ? 97 : 420, pick(20, 170));
+        newBackground();
         for (int n = pick(1, 25); n > 0; --n)
             addRandomFixture();
         finish();
@@ -103,18 +101,32 @@ public:
         return calls;
     }
 
-    // The same calls at other strengths, one in three as it was.
-    void fade(std::vector<Call>& calls) {
+    // Makes the calls of the next frame out of those of the last one. Returns how: 1 the same, 2 in another order, 3
+    // half of them twice, 4 to 6 others, 7 and 8 two in three at other strengths.
+    int nextFrame(std::vector<Call>& calls) {
+        constexpr std::array kShares{100, 5, 40, 0, 90};
+        const std::int32_t kind = pick(1, 8);
+        if (kind > 1 && kind < 7) calls = frame(kShares[static_cast<std::size_t>(pick(0, 4))]);
+        for (std::size_t i = calls.size(); kind == 2 && i > 1; --i)
+            std::swap(calls[i - 1], calls[static_cast<std::size_t>(pick(0, static_cast<int>(i) - 1))]);
+        const std::vector<Call> half(calls.begin(), calls.begin() + std::ssize(calls) / 2);
+        if (kind == 3) calls.insert(calls.end(), half.begin(), half.end());
         for (Call& call : calls) {
-            if (pick(1, 3) == 1) continue;
+            if (kind < 7 || pick(1, 3) == 1) continue;
             const auto alpha = static_cast<std::uint8_t>(pick(1, 255));
             if (call.channel) call.channel->Alpha = alpha;
             if (call.group && call.group->Alpha != 0) call.group->Alpha = alpha;
         }
+        return kind;
     }
 
     std::int32_t pick(std::int32_t low, std::int32_t high) { return ZephReturnRandomNumber(low, high, random_); }
-    SeededRandom& random() { return random_; }
+    void newBackground() {
+        for (int place = 0; place < background.width() * background.height(); ++place) {
+            const QPoint at(place % background.width(), place / background.width());
+            background.setPixel(at, 0xFF000000U | static_cast<unsigned>(pick(0, kWhite)));
+        }
+    }
 
 private:
     void addRandomFixture() {
@@ -123,8 +135,8 @@ private:
         const bool rgb = type >= kFixtureKesh || pick(1, 3) == 1;
         ZephFixture& fixture = add(type, {});
         const std::int32_t unit = simulation->FixtureCount;
-        fixture.BulbSize = type == kFixtureFlood ? pick(0, 66) : pick(1, 3) == 1 ? pick(0, 17) : pick(1, 4);
-        fixture.BulbShape = pick(0, 60) == 0 ? 99 : everyShape_ ? pick(1, 11) : 3;
+        fixture.BulbSize = type == kFixtureFlood ? pick(-1, 66) : pick(1, 3) == 1 ? pick(-1, 17) : pick(1, 4);
+        fixture.BulbShape = pick(0, 60) == 0 ? 99 : everyShape_ ? pick(0, 12) : 3;
         fixture.ZOrder = pick(1, 4);
         fixture.BulbSpacing = pick(0, 4);
         fixture.Kesh.Base_Unit = fixture.DMX.Universe = unit;
@@ -134,8 +146,7 @@ private:
             const std::int32_t kind = type == kFixtureStrings ? (pick(1, 5) == 1 ? kPointMove : kPointLine)
                                       : pick(1, 8) == 1       ? kPointPlaceHolder
                                                               : kPointBulb;
-            const bool far = type != kFixtureStrings && pick(1, 20) == 1;
-            const std::int32_t reach = far ? 140'000'000 : 70;
+            const std::int32_t reach = type != kFixtureStrings && pick(1, 20) == 1 ? 140'000'000 : 70;
             addPoint(fixture, kind,
                      {pick(-reach, background.width() + reach / 2), pick(-reach, background.height() + reach / 2)});
         }
@@ -155,9 +166,8 @@ private:
         Call call;
         call.channel = ChannelDraw{slot.Level, slot.Fixture, slot.Channel, 0, randomAlpha()};
         if (simulation->Fixtures[slot.Fixture].Channels[slot.Channel].Sub_Type == kSpecialStrobes) {
-            const ZephFixtureState& state = (*states)[slot.Fixture];
-            call.lit.resize(
-                static_cast<std::size_t>(state.BulbLocations[static_cast<std::size_t>(slot.Channel)].Count + 1));
+            const std::int32_t bulbCount = bulbLocations((*states)[slot.Fixture], slot.Channel)->Count;
+            call.lit.resize(static_cast<std::size_t>(bulbCount + 1));
             for (std::uint8_t& bulb : call.lit)
                 bulb = static_cast<std::uint8_t>(pick(0, 1));
         }

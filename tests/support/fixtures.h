@@ -15,6 +15,12 @@ inline void addPoint(ZephFixture& fixture, std::int32_t type, const Place& place
     fixture.DrawPoints[++fixture.PointCount] = {type, place.X * TwipsPerPixelX, place.Y * TwipsPerPixelY};
 }
 
+// The next bulb, or the next point of a light string's one stroke.
+inline void addPlace(ZephFixture& fixture, const Place& place) {
+    const std::int32_t stroke = fixture.PointCount == 0 ? kPointMove : kPointLine;
+    addPoint(fixture, fixture.Fixture_Type == kFixtureStrings ? stroke : kPointBulb, place);
+}
+
 // A new fixture behind the others, as the settings of a first run make one: round bulbs of size 2, level 1, without
 // channels. Light strings are one stroke through the places, others have a bulb at each.
 inline ZephFixture& addFixture(ZephSimulation& document, std::int32_t type, std::initializer_list<Place> places = {}) {
@@ -23,10 +29,8 @@ inline ZephFixture& addFixture(ZephSimulation& document, std::int32_t type, std:
     fixture.Fixture_Type = type;
     fixture.Name = "F" + std::to_string(document.FixtureCount);
     if (type >= kFixtureKesh) fixture.Channel_Type = kChannelRgb;
-    for (const Place& place : places) {
-        const std::int32_t stroke = fixture.PointCount == 0 ? kPointMove : kPointLine;
-        addPoint(fixture, type == kFixtureStrings ? stroke : kPointBulb, place);
-    }
+    for (const Place& place : places)
+        addPlace(fixture, place);
     return fixture;
 }
 

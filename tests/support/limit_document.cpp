@@ -3,22 +3,16 @@
 #include "tests/support/fixtures.h"
 #include "util/color.h"
 
-#include <array>
-
 namespace {
 
 constexpr std::int32_t kUnitsInNetwork = 240;
 
 // Fixture number n owns controller n: no two fixtures share an address.
 void addControllerChannel(ZephFixture& fixture, int number, int slot) {
-    static constexpr std::array<std::int32_t, 6> kColors{packColor(255, 0, 0),   packColor(0, 255, 0),
-                                                         packColor(0, 0, 255),   packColor(255, 255, 255),
-                                                         packColor(255, 160, 0), packColor(160, 0, 255)};
-    ZephChannel& channel = addChannel(fixture, 1 + (number - 1) % kUnitsInNetwork, slot,
-                                      kColors[static_cast<std::size_t>(number + slot) % kColors.size()]);
+    const std::int32_t color = packColor(255, 51 * (slot % 6), 51 * (number % 6));
+    ZephChannel& channel = addChannel(fixture, 1 + (number - 1) % kUnitsInNetwork, slot, color);
     channel.Network = (number - 1) / kUnitsInNetwork;
     channel.Name = "Unit " + std::to_string(number) + " circuit " + std::to_string(slot);
-    channel.LED = slot % 2 == 0;
 }
 
 }  // namespace
@@ -26,8 +20,7 @@ void addControllerChannel(ZephFixture& fixture, int number, int slot) {
 void buildLimitDocument(ZephSimulation& simulation, const LimitDocumentOptions& options) {
     constexpr std::int32_t kRows = kMaxFixtures / 2;
     constexpr std::int32_t kColumnPx = kMaxCanvasPixels / 2;
-    const std::int32_t pitchPx = options.bulbSpacing + 2 * options.bulbSize;
-    const bool separate = options.fixtureType >= kFixtureBulbs;
+    const std::int32_t pitchPx = 2 * options.bulbSize;
     simulation.Background = {1, "", 100, kMaxCanvasPixels * TwipsPerPixelX, kMaxCanvasPixels * TwipsPerPixelY};
     simulation.Dimmed = 50;
     for (int level = 1; level <= kLevels; ++level)
@@ -42,18 +35,12 @@ void buildLimitDocument(ZephSimulation& simulation, const LimitDocumentOptions& 
         fixture.Name = "String " + std::to_string(f);
         fixture.Channel_Type = kChannelNormal;
         fixture.BulbSize = options.bulbSize;
-        fixture.BulbSpacing = options.bulbSpacing;
-        fixture.BulbShape = options.bulbShape;
+        fixture.BulbSpacing = 0;
         fixture.ZOrder = 1 + (f - 1) % kLevels;
         fixture.Sample = {0, 255, 128, 64};
         const Place first{(f - 1) / kRows * kColumnPx + 100, ((f - 1) % kRows + 1) * pitchPx};
-        for (int p = 0; p < options.points; ++p) {
-            addPoint(fixture,
-                     separate ? kPointBulb
-                     : p == 0 ? kPointMove
-                              : kPointLine,
-                     {first.X + p * pitchPx, first.Y});
-        }
+        for (int p = 0; p < options.points; ++p)
+            addPlace(fixture, {first.X + p * pitchPx, first.Y});
         // The walk places a bulb that lands on the end of a line; half a pitch of slack keeps the count out of doubt.
         fixture.DrawPoints[options.points].X += pitchPx * TwipsPerPixelX / 2;
         for (int c = 1; c <= options.channels; ++c)

@@ -15,11 +15,10 @@ public:
         std::string title;
         std::string text;
         BoxIcon icon;
-        BoxButtons buttons;
     };
 
     BoxAnswer messageBox(std::string_view title, std::string_view text, BoxIcon icon, BoxButtons buttons) override {
-        boxes.push_back({std::string(title), std::string(text), icon, buttons});
+        boxes.push_back({std::string(title), std::string(text), icon});
         if (answers.empty()) return buttons == BoxButtons::Ok ? BoxAnswer::Ok : BoxAnswer::No;
         const BoxAnswer answer = answers.front();
         answers.pop_front();
@@ -31,7 +30,7 @@ public:
     }
     void setBusyPointer(bool busy) override { busyPointer = busy; }
     void showCompileErrors(std::string_view text) override { compileErrors.emplace_back(text); }
-    void pumpEvents() override { ++pumps; }
+    void pumpEvents() override {}
 
     // "title|text" of each box, a line each.
     std::string boxTexts() const {
@@ -47,7 +46,6 @@ public:
     std::vector<std::string> panel2History;
     std::vector<std::string> compileErrors;
     bool busyPointer = false;
-    int pumps = 0;
 };
 
 class CollectingFailures : public FailureReport {

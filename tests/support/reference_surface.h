@@ -20,7 +20,7 @@ public:
 
     void drawChannel(const ChannelDraw& draw) override {
         const ZephFixture& fixture = scene_.Document.Fixtures[draw.Fixture];
-        const ZephBulbLocations& bulbs = locations(draw.Fixture, draw.Channel);
+        const ZephBulbLocations& bulbs = *bulbLocations(scene_.States[draw.Fixture], draw.Channel);
         for (std::int32_t b = 1; b <= bulbs.Count; ++b) {
             if (draw.BulbLit != nullptr && draw.BulbLit[b - 1] == 0) continue;
             drawBulb(channelImage(fixture, draw.Channel, b, scene_.Bulbs[draw.Fixture]), draw.Alpha,
@@ -30,12 +30,11 @@ public:
 
     void drawGroup(const GroupDraw& draw, ZephRGBData& group) override {
         if (draw.Alpha == 0 || (draw.Bulbs != nullptr && draw.BulbCount == 0)) return;
-        const bool rebuild = RGBBulbRebuildNeeded(group);
-        if (rebuild || group.Bulb == 0) {
+        if (RGBBulbRebuildNeeded(group) || group.Bulb == 0) {
             ZephUpdateRGBChannelBulb(scene_.Document.Fixtures[draw.Fixture], draw.Color, scene_.Masks, cache_, pool_,
                                      group);
         }
-        const ZephBulbLocations& bulbs = locations(draw.Fixture, 1);
+        const ZephBulbLocations& bulbs = *bulbLocations(scene_.States[draw.Fixture], 1);
         const std::int32_t count = draw.Bulbs != nullptr ? draw.BulbCount : bulbs.Count;
         for (std::int32_t i = 0; i < count; ++i) {
             const std::int32_t bulb = draw.Bulbs != nullptr ? draw.Bulbs[i] : i + 1;
@@ -46,10 +45,6 @@ public:
     const QImage& image() const { return image_; }
 
 private:
-    const ZephBulbLocations& locations(std::int32_t fixture, std::int32_t location) const {
-        return scene_.States[fixture].BulbLocations[static_cast<std::size_t>(location)];
-    }
-
     void drawBulb(const BulbImage& image, std::uint32_t alpha, std::int32_t pool0) {
         const ZephBulbLocation& bulb = scene_.Tables.BulbPool[static_cast<std::size_t>(pool0)];
         if (image.Mask == nullptr || bulb.Type == kPointPlaceHolder) return;
