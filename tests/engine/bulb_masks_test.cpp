@@ -30,10 +30,15 @@ TEST(BulbMasks, AreHardAndEveryShapeIsVisibleAtEverySize) {
     EXPECT_EQ(drawn(bulbs[4][2]), "...#..../...##.../..###.../..####../..#####./.######./.#######/########");
     EXPECT_EQ(ZephStarEight.at(16)[5], (ShapeVertex{24, 16}));
     EXPECT_EQ(ZephStarFive.at(16)[6], (ShapeVertex{6, 32}));
-    for (std::int32_t size = 1; size <= kMaxBulbSize; ++size) {
-        for (std::int32_t shape = 1; shape <= kBulbShapes; ++shape)
-            EXPECT_NE(drawn(bulbs[size][shape]).find('#'), std::string::npos) << size << " " << shape;
+    ZephFixture fixture;
+    fixture.Fixture_Type = kFixtureBulbs;
+    for (fixture.BulbSize = 1; fixture.BulbSize <= kMaxBulbSize; ++fixture.BulbSize) {
+        for (fixture.BulbShape = 1; fixture.BulbShape <= kBulbShapes; ++fixture.BulbShape)
+            EXPECT_NE(drawn(*maskOf(masks(), fixture)).find('#'), std::string::npos) << fixture.BulbSize;
     }
+    fixture.Fixture_Type = kFixtureFlood;
+    fixture.BulbSize = kMaxFloodSize;
+    EXPECT_EQ(maskOf(masks(), fixture), &masks().ZephFloodMasks[kMaxFloodSize]);
 }
 
 TEST(FloodMasks, AreStaircasesOfRingsUnderTheCurve) {

@@ -105,15 +105,3 @@ TEST(EditorLights, ClosedLevelsAreDimmedOrHiddenAndFloodsNeverPassTheirTopOpacit
     flood.drawn();
     EXPECT_EQ(flood.canvas.pixel(8, 3), 0xFFFF9999U);
 }
-
-TEST(EditorLights, WrongNumbersFormatsAndSizesDrawNothing) {
-    Desk desk(kFixtureBulbs, {{8, 3}});
-    desk.light(kRed);
-    EXPECT_EQ(desk.drawn(0) + desk.drawn(2), "........................................");
-    ZephDrawLights(desk.context(), {.Fixture = 1, .Channel = 17, .Intensity = 100}, desk.canvas);
-    EXPECT_EQ(desk.row(), "....................");
-    QImage gray(20, 6, QImage::Format_Grayscale8);
-    gray.fill(7);
-    ZephDrawEditorLights(desk.context(), 1, gray);
-    EXPECT_EQ(gray.pixelColor(8, 3).red(), 7);
-}

@@ -55,7 +55,6 @@ TEST_F(MainWindow, ShowsTheDisplayOfTheCommandLineOrNone) {
     program.parms.FileToOpen = "/nowhere/gone.zee";
     window.start();
     EXPECT_EQ(document().FileName, "");
-    EXPECT_EQ(document().FilePath, "");
     EXPECT_FALSE(action("mnuSimulationMode")->isEnabled());
 
     open();

@@ -123,13 +123,9 @@ TEST_F(OptionsDialog, AnAdapterShowsItsAddressAndAWrongPortLeadsToItsField) {
 
     EXPECT_EQ(find<QComboBox>("cmbAdapter")->placeholderText(), "Gone");
     EXPECT_EQ(find<QLabel>("lblLocalIP")->text(), "IP address: 127.0.0.1");
-    const auto ground = [this] { return find<QLabel>("lblLocalIP")->grab().toImage().pixelColor(4, 4); };
-    const QColor usual = ground();
     choose("cmbAdapter", "Spare");
     EXPECT_EQ(find<QLabel>("lblLocalIP")->text(), "IP address: 0.0.0.0");
-    EXPECT_GT(ground().red(), 2 * ground().green());
     choose("cmbAdapter", "Stage");
-    EXPECT_EQ(ground(), usual);
     QTest::keyClicks(find<QLineEdit>("txtZephPort"), "65535");
     click("cmdOK");
     EXPECT_TRUE(accepted());

@@ -1,7 +1,6 @@
 #include "shell/settings_values.h"
 #include "tests/shell/settings_rig.h"
 #include "tests/support/folder.h"
-#include "util/random_source.h"
 #include "util/settings_store.h"
 
 namespace {
@@ -101,25 +100,6 @@ TEST_F(FileStore, ADamagedFileGivesWhatIsLegible) {
         if (ofFile) {
             EXPECT_TRUE(content().contains('\n' + line + '\n'));
         }
-    }
-}
-
-TEST_F(FileStore, AFileWithSpoiltBytesNeverStopsTheStart) {
-    SettingsRig rig;
-    FileSettingsStore whole(file);
-    ZephWriteClosingRegistry(rig.on(whole), rig.settings, false);
-    const QByteArray good = content();
-    SeededRandom random(7);
-    for (int round = 0; round < 40; ++round) {
-        QByteArray spoilt = good;
-        for (int byte = 0; byte < 60; ++byte)
-            spoilt[static_cast<qsizetype>(random.next() * static_cast<double>(spoilt.size()))] =
-                static_cast<char>(random.next() * 256);
-        folder.write(name, spoilt);
-        FileSettingsStore store(file);
-        ASSERT_TRUE(ZephReadRegistryDefaults(rig.on(store), rig.settings, rig.connection, rig.adapters));
-        EXPECT_LE(rig.settings.BulbSize, 16);
-        EXPECT_LE(rig.settings.SimulationPort, 65535);
     }
 }
 
