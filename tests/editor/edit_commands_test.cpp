@@ -108,7 +108,11 @@ TEST_F(EditCommands, AFixtureComesHomeSelectedAsOneStep) {
     EXPECT_EQ(star.DrawPoints[2].Y, ZephHandleSize + 24 * kPx);
     EXPECT_EQ(settings.LastFixtureFile, chosen);
     EXPECT_EQ(host.panels[2], "Fixture Selected:Star - Layer:1");
+    choose("bare.zff", fixtureFileText(bulbs("Bare", 40, 50), kChannelChoiceNo, ""));
+    mnuInsertFixture_Click(context);
+    EXPECT_EQ(host.boxes.size(), 1U) << "nothing to ask about";
 
+    mnuUndo_Click(context);
     mnuUndo_Click(context);
     EXPECT_EQ(rig.simulation->FixtureCount, 3);
     EXPECT_EQ(rig.editor.ZephSelection.Object, 0);

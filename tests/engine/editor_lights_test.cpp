@@ -69,6 +69,7 @@ TEST(EditorLights, PointsAreCutAtTheEdgesAndPlaceHoldersAreNotShown) {
     desk.fixture.DrawPoints[2].Type = kPointPlaceHolder;
     desk.fixture.Sample = {0, 0, 0, 255};
     EXPECT_EQ(desk.drawn(), "b......bb..........b");
+    EXPECT_EQ(desk.canvas.pixel(0, 4), 0xFFFFFFFFU) << "what is cut at the right does not come in again at the left";
     const auto point = [&](std::int32_t number) {
         desk.prepare();
         ZephDrawLights(desk.context(), {.Fixture = 1, .Intensity = 100, .PixelNumber = number}, desk.canvas);

@@ -40,6 +40,7 @@ TEST_F(RenderCycle, CommandsWithoutDurationTakeEffectAtOnceAndGoOnUntilReplacedO
     command(1, 1, 0, 20);
     command(1, 1, 0, 30);
     command(9, 9, 0, 50);
+    EXPECT_EQ(tables.NewEntryCount, 1U);
     EXPECT_EQ(shown({27}), "1=30") << "only the last of two counts";
     command(1, 1, 100, 0);
     EXPECT_EQ(shown({36, 45}), "1=0, ") << "a command to zero is carried out once";

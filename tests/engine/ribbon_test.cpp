@@ -215,8 +215,11 @@ TEST(RgbEffects, TheGlitterLoopLeavesWhenNoColourCanComeOn) {
     const ZephRenderSlot slot = rig.tables.Slots[0];
     EXPECT_FALSE(ShimmerRGB(slot, {.elapsed = 100'000}, context));  // Mode 1: driven by plain commands
     rig.group().Mode = {0, 0, 2, 0};
-    rig.random.values = {0.1, 0.2, 0.8};
-    EXPECT_TRUE(ShimmerRGB(slot, {.elapsed = 100'000}, context));
+    rig.random.values = {0.1, 0.709, 0.8};  // on from 71 in 100
+    rig.ribbon().KeshSpeed = 10;
+    EXPECT_FALSE(ShimmerRGB(slot, {.elapsed = 400}, context)) << "the step is not due";
+    EXPECT_TRUE(ShimmerRGB(slot, {.elapsed = 401}, context));
+    EXPECT_FALSE(TwinkleRGB(slot, {.elapsed = 220}, context));
     EXPECT_THAT(rig.group().EffectLevel, ElementsAre(0, 0, 255, 0));
     EXPECT_THAT(rig.random.values, testing::IsEmpty()) << "drawn until the one colour came on";
 }

@@ -185,7 +185,7 @@ TEST(ObjectFiles, APropListsWhatCameAlongAndNothingElse) {
         ObjectBench bench;
         ZephSimulation& document = *bench.simulation;
         document.FixtureCount = 10;
-        document.Props[1].QvFF = "left behind by a damaged file";
+        document.Props[1].QvFF = document.Fixtures[11].AssignedItemName = "left behind by a damaged file";
         ASSERT_TRUE(bench.propText(file("ZephProp", "2.1.0", items(listed) + objects(fixtures))));
         EXPECT_EQ(document.FixtureCount, 10 + fixtures);
         EXPECT_EQ(document.Props[1].AssignedCount, members);

@@ -142,6 +142,10 @@ TEST(Undo, SharesWhatDidNotChange) {
     const DocumentSnapshot after = takeSnapshot(document, bench.paths, before);
     const auto shared = [&](const PackedRecord& record) { return std::ranges::count(before.Fixtures, record) > 0; };
     EXPECT_EQ(std::ranges::count_if(after.Fixtures, shared), 56) << "all but the two changed and the two deleted";
+    restoreSnapshot(before, bench.paths, document);
+    const DocumentSnapshot again = takeSnapshot(document, bench.paths, after);
+    const auto kept = [&](const PackedRecord& record) { return std::ranges::count(after.Fixtures, record) > 0; };
+    EXPECT_EQ(std::ranges::count_if(again.Fixtures, kept), 56) << "also where the two come back";
 }
 
 TEST(Undo, KeepsTwentyStepsAndRunsBackAndForth) {

@@ -117,6 +117,8 @@ TEST_F(MainWindow, SimulatesAndComesBackByEsc) {
     arrive("0");
     EXPECT_EQ(find<QProgressBar>("prbQueueLen")->value(), 1'600'001);
     EXPECT_TRUE(find<QProgressBar>("prbQueueLen")->styleSheet().contains("#ffff00"));
+    key(Qt::Key_Escape);
+    EXPECT_TRUE(program.receive.Stream.ZephStackBuffer.empty());
 }
 
 TEST_F(MainWindow, ReturnsToTheEditorFromEachFailureToEnter) {
