@@ -45,7 +45,6 @@ bool readLoneFixture(const Node& object, const BodyContext& body, int slot, Zeph
     const bool read =
         editor_body_detail::loadDrawObject(object, body, fixture, simulation.FixtureLedDefault, channelsSeen);
     fixture.AssignedItem = 0;
-    fixture.AssignedItemName.clear();
     return read;
 }
 

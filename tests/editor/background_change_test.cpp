@@ -91,9 +91,14 @@ TEST_F(BackgroundChange, ATypedSizeIsANumberWithinTheLimits) {
 
 TEST_F(BackgroundChange, ANewSimulationKeepsNothingOfTheOldOne) {
     ZephEditorState editor;
-    editor.ZephSelection.Object = editor.ZephAppendTarget = 2;
+    editor.ZephSelection.Object = 2;
     ZephUndoStores stores;
+    editor.ZephClipboard.resize(1);
+    stores.UndoPosition = 1;
     EditorStateWatcher watcher(editor, stores);
+    editor.ZephAppendTarget = 3;
+    watcher.fixtureRemoved(2);
+    EXPECT_EQ(editor.ZephAppendTarget, 2) << "the same fixture, which has moved down";
     simulation->FileName = "old.zee";
     simulation->SimulationDirty = simulation->ChecksumMismatch = true;
     simulation->Props[1].Name = "Tree";
@@ -106,5 +111,6 @@ TEST_F(BackgroundChange, ANewSimulationKeepsNothingOfTheOldOne) {
     fresh.Background = {kBackgroundPicture, "/a.jpg", 100, 1500, 900};
     beginSimulation(fresh.Background, *simulation, watcher);
     EXPECT_TRUE(*simulation == fresh);
-    EXPECT_EQ(editor.ZephSelection.Object + editor.ZephAppendTarget, 0);
+    EXPECT_EQ(editor.ZephSelection.Object + editor.ZephAppendTarget + stores.UndoPosition, 0);
+    EXPECT_TRUE(editor.ZephClipboard.empty());
 }

@@ -163,6 +163,7 @@ TEST(ColourEffects, TakeTheColoursOverAndGiveThemBackToTheNextCommand) {
     rig.shown({9, 700});
     EXPECT_THAT(rig.surface.groups.at(0).levels, ElementsAre(255, 255, 255));
     EXPECT_THAT(rig.group().Mode, ElementsAre(0, 2, 2, 2));
+    EXPECT_FALSE(rig.ribbon().KeshResolutionChanged);
 
     rig.send(1, 100, 700);
     rig.pass(709);

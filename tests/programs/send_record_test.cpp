@@ -192,5 +192,10 @@ TEST_F(Sending, OnRequestPlaysAndStopsAsTheButtonsAsk) {
     EXPECT_EQ(heard(ear, 100), 0);
     EXPECT_EQ(player.stop(SIGTERM), 0);
     EXPECT_EQ(registered(), "0");
+    Running second([options] { return runSend(options); });
+    ASSERT_TRUE(eventually([&] { return registered() == std::to_string(pid); }));
+    FileSettingsStore(FileSettingsStore::userFile()).setValue(kSharedIpcKey, "SeqPid", "1");
+    EXPECT_EQ(second.stop(SIGTERM), 0);
+    EXPECT_EQ(registered(), "1") << "who registered since keeps the place";
     qunsetenv("ZEPH_DATA");
 }
