@@ -158,6 +158,7 @@ TEST(ColourEffects, TakeTheColoursOverAndGiveThemBackToTheNextCommand) {
     RibbonRig rig;
     rig.send(157, 100);
     rig.send(155, 7);  // white twinkle
+    rig.ribbon().KeshResolutionChanged = true;
     rig.random.otherwise = 0.9;
     // The keys run 155 before 157, so the first step still had no intensity; the next comes 580 ms later at speed 0.
     rig.shown({9, 700});

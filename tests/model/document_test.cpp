@@ -75,9 +75,9 @@ TEST(Deleting, APropMovesTheLaterOnesDownAndFreesItsMembers) {
     Display display(3, 3);
     for (const int n : {1, 2, 3})
         ZephAddFixtureToProp(n, n, *display.simulation);
-    display.simulation->Props[kMaxProps].Name = "moves down, and is not there twice";
+    display.simulation->Props[kMaxProps].Locked = true;
     EXPECT_TRUE(ZephDeleteThisProp(2, *display.simulation));
-    EXPECT_EQ(display.simulation->Props[kMaxProps].Name, "");
+    EXPECT_FALSE(display.simulation->Props[kMaxProps].Locked) << "moves down, and is not there twice";
     EXPECT_EQ(display.simulation->PropCount, 2);
     EXPECT_EQ(display.simulation->Props[2].Name, "P3");
     for (const auto& [fixture, prop] : {std::pair{1, 1}, {2, 0}, {3, 2}})
