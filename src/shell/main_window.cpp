@@ -110,6 +110,11 @@ void frmZephMain::dataArrived() {
                                                       program_.failures, program_.receive));
 }
 
+void frmZephMain::showEvent(QShowEvent*) {
+    constexpr int kFrameKnownMs = 200;  // the window manager answers some time after the window is up
+    QTimer::singleShot(kFrameKnownMs, this, &frmZephMain::keepFrameOnScreen);
+}
+
 void frmZephMain::closeEvent(QCloseEvent* event) {
     if (inTick_) {
         // Not under a pass: the tick asks again when it is done.

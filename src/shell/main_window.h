@@ -45,6 +45,7 @@ public:
     bool openFile(const QString& path, bool quiet);
 
 protected:
+    void showEvent(QShowEvent* event) override;
     void closeEvent(QCloseEvent* event) override;
     bool eventFilter(QObject* watched, QEvent* event) override;
 
@@ -120,6 +121,7 @@ private:
     void build();
     void connectControls();
     void placeAtStart();
+    void keepFrameOnScreen();
     void showEditorControls(bool shown);
     void UpdateRecentFileMenu();
     EditContext editContext();

@@ -73,6 +73,17 @@ void frmZephMain::placeAtStart() {
     resize(place.size());
 }
 
+// With the frame that the window manager draws around it, the lower edge of a tall window, and its status bar, would
+// lie below the screen.
+void frmZephMain::keepFrameOnScreen() {
+    if (program_.simulating() || isMaximized() || isFullScreen() || isMinimized()) return;
+    const QRect room = screen()->availableGeometry();
+    const QSize around = frameGeometry().size() - size();
+    const QRect place = placedInside(QRect(pos(), size()), QRect(room.topLeft(), room.size() - around));
+    if (place.size() != size()) resize(place.size());
+    if (place.topLeft() != pos()) move(place.topLeft());
+}
+
 void frmZephMain::showQueueGauge(bool shown) {
     StatusBar1_->showQueueGauge(shown);
 }

@@ -13,12 +13,18 @@ int movedInside(int first, int length, int least, int most) {
 
 }  // namespace
 
-QRect ZephWindowPlace(const ZephSettings& settings, const QRect& available) {
-    const int width = std::min(settings.Width / TwipsPerPixelX, available.width());
-    const int height = std::min(settings.Height / TwipsPerPixelY, available.height());
-    const int left = movedInside(settings.Left / TwipsPerPixelX, width, available.left(), available.right());
-    const int top = movedInside(settings.Top / TwipsPerPixelY, height, available.top(), available.bottom());
+QRect placedInside(const QRect& wanted, const QRect& available) {
+    const int width = std::min(wanted.width(), available.width());
+    const int height = std::min(wanted.height(), available.height());
+    const int left = movedInside(wanted.left(), width, available.left(), available.right());
+    const int top = movedInside(wanted.top(), height, available.top(), available.bottom());
     return {left, top, width, height};
+}
+
+QRect ZephWindowPlace(const ZephSettings& settings, const QRect& available) {
+    const QRect stored(settings.Left / TwipsPerPixelX, settings.Top / TwipsPerPixelY, settings.Width / TwipsPerPixelX,
+                       settings.Height / TwipsPerPixelY);
+    return placedInside(stored, available);
 }
 
 void ZephKeepWindowPlace(const QRect& place, int state, ZephSettings& settings) {

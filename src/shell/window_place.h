@@ -5,8 +5,10 @@
 
 #include <QRect>
 
-// Where the window is to stand, in pixels. available: the part of its screen that windows may cover; a window that
-// would lie outside it is moved and shrunk into it.
+// The place moved, and where need be shrunk, so that it lies in what is available.
+QRect placedInside(const QRect& wanted, const QRect& available);
+
+// Where the window is to stand, in pixels. available: the part of its screen that windows may cover.
 QRect ZephWindowPlace(const ZephSettings& settings, const QRect& available);
 
 // Keeps the place for the next run. place: of the window when it is neither maximised nor minimised, pixels.
