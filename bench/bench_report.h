@@ -1,5 +1,7 @@
 // What every benchmark hands its figures to, and how they are taken: rows of times in groups, whose first row is the
 // one that the others are compared with, and the goals that the program holds itself to.
+// Not by a benchmark library: those measure one subject after the other, and the ratios here are between things that
+// must be measured in turns, each after a preparation that does not count.
 #pragma once
 
 #include <algorithm>
