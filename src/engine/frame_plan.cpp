@@ -19,13 +19,8 @@ public:
         plan_.Units.resize(1);
     }
 
-    void addAll() {
-        numberUnitsPainted(
-            tables_, [&](std::int32_t fixture, std::int32_t channel) { addChannel(fixture, channel); },
-            [&](std::int32_t fixture) { addGroup(fixture); }, plan_.NumberOf);
-    }
+    void addAll() { numberUnitsPainted(tables_, *this, plan_.NumberOf); }
 
-private:
     void addChannel(std::int32_t fixture, std::int32_t channel) {
         const std::int32_t number = addUnit(fixture, channel);
         const ZephFixture& record = document_.Fixtures[fixture];
@@ -72,6 +67,7 @@ private:
         }
     }
 
+private:
     std::int32_t addUnit(std::int32_t fixture, std::int32_t channel) {
         const ZephFixtureState& state = states_[fixture];
         PlanUnit unit{.Fixture = fixture};

@@ -19,13 +19,8 @@ public:
         plan_.Units.resize(1);
     }
 
-    void addAll() {
-        numberUnitsPainted(
-            tables_, [&](std::int32_t fixture, std::int32_t channel) { addChannel(fixture, channel); },
-            [&](std::int32_t fixture) { addGroup(fixture); }, plan_.NumberOf);
-    }
+    void addAll() { numberUnitsPainted(tables_, *this, plan_.NumberOf); }
 
-private:
     void addChannel(std::int32_t fixture, std::int32_t channel) {
         const ZephChannel& record = document_.Fixtures[fixture].Channels[channel];
         GLPlanUnit unit = newUnit(fixture, channel);
@@ -61,6 +56,7 @@ private:
         addUnit(unit);
     }
 
+private:
     static std::uint32_t packed(std::int32_t color) noexcept {
         return static_cast<std::uint32_t>(color) & static_cast<std::uint32_t>(kWhite);
     }

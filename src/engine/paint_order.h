@@ -19,10 +19,10 @@ struct UnitNumbers {
 };
 
 // Numbers the units level by level in table order, the plain channels of a level before its RGB groups, as the render
-// cycle calls for them, and calls addChannel(fixture, channel) or addGroup(fixture) for each as it gets its
-// number. Numbers that no fixture or channel has are left out.
-template <typename AddChannel, typename AddGroup>
-void numberUnitsPainted(const ZephRenderTables& tables, AddChannel addChannel, AddGroup addGroup, UnitNumbers& units) {
+// cycle calls for them, and calls the builder's addChannel(fixture, channel) or addGroup(fixture) for each as it
+// gets its number. Numbers that no fixture or channel has are left out.
+template <typename Builder>
+void numberUnitsPainted(const ZephRenderTables& tables, Builder& builder, UnitNumbers& units) {
     units.OfChannel.assign(kChannelSlots, 0);
     units.OfGroup.assign(tables.RGBData.size(), 0);
     std::int32_t count = 0;
@@ -44,12 +44,13 @@ void numberUnitsPainted(const ZephRenderTables& tables, AddChannel addChannel, A
         forEachSlot(level, [&](const ZephRenderSlot& slot) {
             const bool plain = !slot.isRGB() && slot.KeshMagic == 0;
             if (!plain || slot.Channel < 1 || slot.Channel > kMaxChannels) return;
-            if (isNew(units.OfChannel[channelSlot(slot.Fixture, slot.Channel)])) addChannel(slot.Fixture, slot.Channel);
+            if (isNew(units.OfChannel[channelSlot(slot.Fixture, slot.Channel)]))
+                builder.addChannel(slot.Fixture, slot.Channel);
         });
         forEachSlot(level, [&](const ZephRenderSlot& slot) {
             if (!slot.isRGB()) return;
             // A group has a slot for each of its colours.
-            if (isNew(units.OfGroup.at(static_cast<std::size_t>(slot.RGBIndex)))) addGroup(slot.Fixture);
+            if (isNew(units.OfGroup.at(static_cast<std::size_t>(slot.RGBIndex)))) builder.addGroup(slot.Fixture);
         });
     }
 }
