@@ -3,16 +3,23 @@
 #include "tests/support/fixtures.h"
 #include "util/color.h"
 
+#include <array>
+
 namespace {
 
 constexpr std::int32_t kUnitsInNetwork = 240;
+constexpr std::int32_t kRound = 1;  // row of the bulb type table
 
 // Fixture number n owns controller n: no two fixtures share an address.
 void addControllerChannel(ZephFixture& fixture, int number, int slot) {
-    const std::int32_t color = packColor(255, 51 * (slot % 6), 51 * (number % 6));
-    ZephChannel& channel = addChannel(fixture, 1 + (number - 1) % kUnitsInNetwork, slot, color);
+    static constexpr std::array<std::int32_t, 6> kColors{packColor(255, 0, 0),   packColor(0, 255, 0),
+                                                         packColor(0, 0, 255),   packColor(255, 255, 255),
+                                                         packColor(255, 160, 0), packColor(160, 0, 255)};
+    ZephChannel& channel = addChannel(fixture, 1 + (number - 1) % kUnitsInNetwork, slot,
+                                      kColors[static_cast<std::size_t>(number + slot) % kColors.size()]);
     channel.Network = (number - 1) / kUnitsInNetwork;
     channel.Name = "Unit " + std::to_string(number) + " circuit " + std::to_string(slot);
+    channel.LED = slot % 2 == 0;
 }
 
 }  // namespace
@@ -36,6 +43,7 @@ void buildLimitDocument(ZephSimulation& simulation, const LimitDocumentOptions& 
         fixture.Channel_Type = kChannelNormal;
         fixture.BulbSize = options.bulbSize;
         fixture.BulbSpacing = 0;
+        fixture.BulbShape = kRound;
         fixture.ZOrder = 1 + (f - 1) % kLevels;
         fixture.Sample = {0, 255, 128, 64};
         const Place first{(f - 1) / kRows * kColumnPx + 100, ((f - 1) % kRows + 1) * pitchPx};
