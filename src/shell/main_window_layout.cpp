@@ -74,14 +74,15 @@ void frmZephMain::placeAtStart() {
 }
 
 // With the frame that the window manager draws around it, the lower edge of a tall window, and its status bar, would
-// lie below the screen.
+// lie below the screen. A window that is not too large stays wherever its user has put it.
 void frmZephMain::keepFrameOnScreen() {
     if (program_.simulating() || isMaximized() || isFullScreen() || isMinimized()) return;
     const QRect room = screen()->availableGeometry();
-    const QSize around = frameGeometry().size() - size();
-    const QRect place = placedInside(QRect(pos(), size()), QRect(room.topLeft(), room.size() - around));
-    if (place.size() != size()) resize(place.size());
-    if (place.topLeft() != pos()) move(place.topLeft());
+    const QSize most = room.size() - (frameGeometry().size() - size());
+    if (size().boundedTo(most) == size()) return;
+    const QRect place = placedInside(QRect(pos(), size()), QRect(room.topLeft(), most));
+    resize(place.size());
+    move(place.topLeft());
 }
 
 void frmZephMain::showQueueGauge(bool shown) {
