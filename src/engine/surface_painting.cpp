@@ -392,11 +392,11 @@ void StandardSurface::paintOver() {
 
 // Asks for the rows of a small bulb ahead of their use; the rows of large ones the processor fetches by itself.
 void StandardSurface::fetchItem(const BulbItem& item) const noexcept {
-    constexpr std::int32_t kFetchedRows = 4;
+    constexpr std::int32_t kSmallBulb = 4;  // pixels, both ways
     const std::int32_t first = std::max(0, std::int32_t{item.Place.Y});
-    const std::int32_t end = std::min(plan_.Height, item.Place.Y + kFetchedRows);
+    const std::int32_t end = std::min(plan_.Height, item.Place.Y + kSmallBulb);
     // A row may lie on two cache lines.
-    const std::int32_t last = item.Place.X + kFetchedRows - 1;
+    const std::int32_t last = item.Place.X + kSmallBulb - 1;
     for (std::int32_t y = first; y < end; ++y) {
         const std::uint32_t* const row = frame_.row(y);
         __builtin_prefetch(row + item.Place.X, 1, 3);
